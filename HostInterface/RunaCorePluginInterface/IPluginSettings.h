@@ -1,0 +1,54 @@
+#pragma once
+
+#include <cstdint>
+#include <memory>
+
+class ISmartObjectControls;
+class IRigidObjectControls;
+
+namespace RunaCorePluginInterface
+{
+
+class IObjectEvaluationSettings;
+class ICharacterSettings;
+class ICalibrationSettings;
+
+/// Bits of the feature mask.
+namespace Feature
+{
+inline constexpr std::uint32_t basicObjects = 1U << 0;
+inline constexpr std::uint32_t smartObjects = 1U << 1;
+inline constexpr std::uint32_t characters = 1U << 2;
+inline constexpr std::uint32_t objectPresets = 1U << 6;
+inline constexpr std::uint32_t proximityGrouping = 1U << 8;
+inline constexpr std::uint32_t objectEvaluation = 1U << 9;
+inline constexpr std::uint32_t markerless = 1U << 14;
+inline constexpr std::uint32_t objectAutoAssign = 1U << 15;
+}
+
+/// Tells which features the host has switched on. [any]
+class IFeatures
+{
+public:
+  virtual ~IFeatures() = default;
+
+  /// One bit for each feature. May change while the program runs: read it afresh where it is needed.
+  [[nodiscard]] virtual std::uint32_t Mask() const = 0;
+};
+
+/// The application's settings: hands out the objects that the plugin's services are configured with. An object that
+/// the host does not have is an empty pointer. [host]
+class IPluginSettings
+{
+public:
+  virtual ~IPluginSettings() = default;
+
+  virtual void Features(std::shared_ptr<IFeatures>& features) const = 0;
+  virtual void SmartObjectControls(std::shared_ptr<ISmartObjectControls>& controls) const = 0;
+  virtual void RigidObjectControls(std::shared_ptr<IRigidObjectControls>& controls) const = 0;
+  virtual void ObjectEvaluationSettings(std::shared_ptr<IObjectEvaluationSettings>& settings) const = 0;
+  virtual void CharacterSettings(std::shared_ptr<ICharacterSettings>& settings) const = 0;
+  virtual void CalibrationSettings(std::shared_ptr<ICalibrationSettings>& settings) const = 0;
+};
+
+}

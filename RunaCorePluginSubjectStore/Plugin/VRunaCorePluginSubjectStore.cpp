@@ -1,0 +1,69 @@
+#include "RunaCorePluginSubjectStore/Plugin/VRunaCorePluginSubjectStore.h"
+
+#include "HostInterface/NMX/GlobalLog.h"
+#include "HostInterface/NotificationSystem/VAsioPostalServiceStrand.h"
+#include "HostInterface/RunaCorePluginInterface/IPluginHost.h"
+#include "HostInterface/RunaCorePluginInterface/IPluginSettings.h"
+#include "HostInterface/TerminalServer2/IServer.h"
+#include "RunaCorePluginSubjectStore/Catalogue/BasicObjectCatalogue.h"
+
+#include <utility>
+
+using namespace RunaCorePluginInterface;
+
+namespace
+{
+
+/// The feature mask as it is now. The host may change it at any time, so nobody keeps it.
+std::uint32_t FeatureMask(const IPluginHost& host)
+{
+  std::shared_ptr<IPluginSettings> settings;
+  host.Settings(settings);
+  std::shared_ptr<IFeatures> features;
+  if (settings)
+    settings->Features(features);
+  return features ? features->Mask() : 0;
+}
+
+std::shared_ptr<NMX::IStore> Store(const IPluginHost& host)
+{
+  std::shared_ptr<NMX::IStore> store;
+  host.Store(store);
+  return store;
+}
+
+/// Publishes the group of `service` on the host's server, with a strand of its own.
+template <class Interface>
+void Publish(const IPluginHost& host, const TerminalServer2::GroupTable<Interface>& table,
+             const std::shared_ptr<Interface>& service)
+{
+  std::shared_ptr<TerminalServer2::IServer> server;
+  host.Server(server);
+  std::shared_ptr<NMX::IAsioPostalService> postal;
+  host.NotificationPostalService(postal);
+  if (!server || !postal)
+  {
+    NMX::Log(NMX::systemLog, NMX::ESeverity::Error, "The host has no server for the group %1%.", table.group.name);
+    return;
+  }
+  const auto strand = NMX::MakeShared<NotificationSystem::VAsioPostalServiceStrand>(std::move(postal));
+  TerminalServer2::RegisterGroup<Interface>(*server, table, service, strand, FeatureMask(host));
+}
+
+}
+
+const char* VRunaCorePluginSubjectStore::DisplayName() const
+{
+  return "Subject and object UI";
+}
+
+bool VRunaCorePluginSubjectStore::RegisterServices(IPluginHost& host)
+{
+  if ((FeatureMask(host) & Feature::basicObjects) != 0)
+  {
+    auto service = NMX::MakeShared<BasicObjectServices::VBasicObjectServices>(Store(host));
+    Publish<NMX::IBasicObjectServices>(host, Catalogue::BasicObjectGroup(), service);
+    m_basicObjectServices = std::move(service);
+  }
+  return true;
+}

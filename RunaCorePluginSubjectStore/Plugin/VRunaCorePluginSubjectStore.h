@@ -1,0 +1,22 @@
+#pragma once
+
+#include "HostInterface/RunaCorePluginInterface/IPlugin.h"
+#include "RunaCorePluginSubjectStore/BasicObjectServices/VBasicObjectServices.h"
+
+#include <memory>
+
+/// The plugin: makes its services from what the host hands out and gives them to the host's server. [host]
+///
+/// The services are released in reverse order of their declaration. Each lives on while the server still holds a
+/// function of it, so the host withdraws the functions before it destroys the plugin.
+class VRunaCorePluginSubjectStore final : public RunaCorePluginInterface::IPlugin
+{
+public:
+  [[nodiscard]] const char* DisplayName() const override;
+
+  /// Makes and publishes the service groups that the feature mask allows. Always true.
+  bool RegisterServices(RunaCorePluginInterface::IPluginHost& host) override;
+
+private:
+  std::shared_ptr<BasicObjectServices::VBasicObjectServices> m_basicObjectServices;
+};

@@ -1,0 +1,14 @@
+#pragma once
+
+#include "HostInterface/NMX/IResult.h"
+
+#include <string_view>
+
+namespace Subjects
+{
+
+/// The check that every new name passes before the store is asked: `InvalidName` when it begins or ends with a space.
+/// All other rules, that of the empty name included, are the store's.
+NMX::IResult CheckNewName(std::string_view name);
+
+}

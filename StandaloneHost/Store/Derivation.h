@@ -1,0 +1,12 @@
+#pragma once
+
+#include "StandaloneHost/Store/Draft.h"
+
+namespace Store
+{
+
+/// Brings up to date, before a commit, what subjects have because of other subjects: a character is warned while an
+/// object in one of its slots has warnings. Costs what the edit touched.
+void DeriveDependents(Draft& draft);
+
+}

@@ -1,0 +1,45 @@
+#pragma once
+
+#include "StandaloneHost/Store/StoreState.h"
+
+#include <map>
+#include <string>
+
+namespace Store
+{
+
+/// The committed state with an edit's changes laid over it. A record is copied the first time that it is changed, so
+/// that an edit costs what it changes, and dropping the draft undoes it.
+class Draft
+{
+public:
+  using Id = NMX::TSubjectStoreId;
+
+  explicit Draft(const StoreState& base);
+
+  [[nodiscard]] const SubjectRecord* Find(Id id) const;
+  [[nodiscard]] const SubjectRecord* Find(std::string_view name) const;
+  [[nodiscard]] std::vector<Id> Subjects(NMX::ESubjectKind kind) const;
+  [[nodiscard]] const NMX::Value* FindApplicationEntry(NMX::EntryPath path) const;
+  [[nodiscard]] std::vector<NMX::EntryPath> ApplicationEntries(NMX::EntryPath path) const;
+
+  /// Adds a subject; nobody has its name.
+  Id Add(NMX::ESubjectKind kind, std::string name);
+  void Remove(Id id);
+  void Rename(Id id, std::string name);
+  void SetApplicationEntry(NMX::EntryPath path, NMX::Value value);
+
+  /// The subject's record, to be changed in the given aspect. The subject exists.
+  SubjectRecord& Change(Id id, NMX::EAspect aspect);
+
+  [[nodiscard]] const StoreState& Base() const { return m_base; }
+  [[nodiscard]] const ChangeSet& Changes() const { return m_changes; }
+  [[nodiscard]] ChangeSet& Changes() { return m_changes; }
+
+private:
+  const StoreState& m_base;
+  ChangeSet m_changes;
+  std::map<std::string, Id, std::less<>> m_names; // names that changed; the invalid id: nobody has it any more
+};
+
+}

@@ -1,0 +1,71 @@
+#include "StandaloneHost/Store/StoreState.h"
+
+#include <utility>
+
+namespace Store
+{
+
+const SubjectRecord* StoreState::Find(NMX::TSubjectStoreId id) const
+{
+  const auto found = m_records.find(id);
+  return found != m_records.end() ? found->second.get() : nullptr;
+}
+
+const SubjectRecord* StoreState::Find(std::string_view name) const
+{
+  const auto found = m_names.find(name);
+  return found != m_names.end() ? found->second : nullptr;
+}
+
+const std::set<NMX::TSubjectStoreId>& StoreState::Subjects(NMX::ESubjectKind kind) const
+{
+  return m_kinds[static_cast<std::size_t>(kind)];
+}
+
+void StoreState::Erase(NMX::TSubjectStoreId id)
+{
+  const auto found = m_records.find(id);
+  if (found == m_records.end())
+    return;
+  m_names.erase(found->second->Name());
+  m_kinds[static_cast<std::size_t>(found->second->kind)].erase(id);
+  m_records.erase(found);
+}
+
+void StoreState::Insert(std::unique_ptr<SubjectRecord> record)
+{
+  auto& place = m_records[record->id];
+  place = std::move(record);
+  m_names.emplace(place->Name(), place.get());
+  m_kinds[static_cast<std::size_t>(place->kind)].insert(place->id);
+}
+
+void StoreState::Apply(ChangeSet&& changes) noexcept
+{
+  // All old names go before the new ones come, so that two subjects can exchange theirs.
+  for (auto& [id, change] : changes.subjects)
+  {
+    if (const SubjectRecord* old = Find(id); old != nullptr && change.record != nullptr)
+      change.record->stamps = old->stamps;
+    Erase(id);
+  }
+  for (auto& [id, change] : changes.subjects)
+  {
+    if (change.record == nullptr)
+      continue;
+    for (std::size_t aspect = 0; aspect < change.record->stamps.size(); ++aspect)
+      if ((change.aspects >> aspect & 1U) != 0)
+        change.record->stamps[aspect] = ++m_lastStamp;
+    Insert(std::move(change.record));
+  }
+  for (auto& [path, value] : changes.applicationEntries)
+  {
+    if (std::holds_alternative<std::monostate>(value))
+      m_application.erase(path);
+    else
+      m_application[path] = std::move(value);
+  }
+  m_nextId = changes.nextId;
+}
+
+}

@@ -1,0 +1,63 @@
+#pragma once
+
+#include "StandaloneHost/Store/SubjectRecord.h"
+
+#include <boost/unordered/unordered_flat_map.hpp>
+
+#include <array>
+#include <map>
+#include <memory>
+#include <set>
+#include <string_view>
+#include <vector>
+
+namespace Store
+{
+
+/// A record that an edit has changed, added or removed.
+struct ChangedSubject
+{
+  std::unique_ptr<SubjectRecord> record; ///< null when the subject is removed
+  NMX::ESubjectKind kind;
+  std::uint8_t aspects = 0; ///< one bit for each EAspect that changed
+};
+
+/// What one commit changes.
+struct ChangeSet
+{
+  std::map<NMX::TSubjectStoreId, ChangedSubject> subjects;
+  std::map<NMX::EntryPath, NMX::Value> applicationEntries; ///< "no value" removes the entry
+  NMX::TSubjectStoreId nextId;
+
+  [[nodiscard]] bool Empty() const { return subjects.empty() && applicationEntries.empty(); }
+};
+
+/// The committed content of the store, with its indexes. Not safe for concurrent use: its owner locks.
+class StoreState
+{
+public:
+  [[nodiscard]] const SubjectRecord* Find(NMX::TSubjectStoreId id) const;
+  [[nodiscard]] const SubjectRecord* Find(std::string_view name) const;
+  [[nodiscard]] const std::set<NMX::TSubjectStoreId>& Subjects(NMX::ESubjectKind kind) const;
+  [[nodiscard]] const std::map<NMX::EntryPath, NMX::Value>& ApplicationEntries() const { return m_application; }
+  [[nodiscard]] NMX::TSubjectStoreId NextId() const { return m_nextId; }
+  [[nodiscard]] std::size_t SubjectCount() const { return m_records.size(); }
+
+  /// Takes over a commit's changes and stamps what changed. The changes are already lasting when this runs, so it may
+  /// not fail: without memory the program ends rather than go on with half of them.
+  void Apply(ChangeSet&& changes) noexcept;
+
+private:
+  void Insert(std::unique_ptr<SubjectRecord> record);
+  void Erase(NMX::TSubjectStoreId id);
+
+  boost::unordered_flat_map<NMX::TSubjectStoreId, std::unique_ptr<SubjectRecord>, std::hash<NMX::TSubjectStoreId>>
+      m_records;
+  boost::unordered_flat_map<std::string_view, const SubjectRecord*> m_names; // keys look into the records
+  std::array<std::set<NMX::TSubjectStoreId>, NMX::allSubjectKinds.size()> m_kinds;
+  std::map<NMX::EntryPath, NMX::Value> m_application;
+  NMX::TSubjectStoreId m_nextId{1};
+  std::uint64_t m_lastStamp = 0;
+};
+
+}

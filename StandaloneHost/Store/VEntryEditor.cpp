@@ -1,0 +1,169 @@
+#include "StandaloneHost/Store/VEntryEditor.h"
+
+#include "StandaloneHost/Store/Derivation.h"
+#include "StandaloneHost/Store/NameRule.h"
+#include "StoreInterface/EntryPaths.h"
+
+#include <algorithm>
+#include <utility>
+
+namespace Store
+{
+
+using NMX::EAspect;
+using NMX::EResult;
+using NMX::IResult;
+
+VEntryEditor::VEntryEditor(const StoreState& state, std::mutex& editMutex, ICommitter& committer)
+    : m_edit(editMutex), m_draft(state), m_committer(committer)
+{
+}
+
+IResult VEntryEditor::Subjects(NMX::ESubjectKind kind, std::vector<Id>& ids) const
+{
+  ids = m_draft.Subjects(kind);
+  return EResult::Ok;
+}
+
+const NMX::Value* VEntryEditor::FindApplicationEntry(NMX::EntryPath path) const
+{
+  return m_draft.FindApplicationEntry(path);
+}
+
+std::vector<NMX::EntryPath> VEntryEditor::ApplicationEntries(NMX::EntryPath path) const
+{
+  return m_draft.ApplicationEntries(path);
+}
+
+IResult VEntryEditor::CheckName(std::string_view name, Id owner) const
+{
+  if (!NameRule::Allows(name))
+    return EResult::InvalidName;
+  const SubjectRecord* holder = m_draft.Find(name);
+  return holder == nullptr || holder->id == owner ? EResult::Ok : EResult::AlreadyPresent;
+}
+
+IResult VEntryEditor::Add(NMX::ESubjectKind kind, std::string_view name, Id& id)
+{
+  if (const IResult checked = CheckName(name, Id{}); checked.Failed())
+    return checked;
+  ForgetLatest();
+  id = m_draft.Add(kind, std::string(name));
+  return EResult::Ok;
+}
+
+IResult VEntryEditor::Remove(Id id)
+{
+  const SubjectRecord* record = Record(id);
+  if (record == nullptr)
+    return EResult::InvalidId;
+  const auto children = record->Children();
+  const Id parent = record->Parent();
+  ForgetLatest();
+  for (const Id child : children)
+    MoveUnder(child, Id{});
+  if (m_draft.Find(parent) != nullptr)
+    RemoveChild(parent, id);
+  m_draft.Remove(id);
+  return EResult::Ok;
+}
+
+IResult VEntryEditor::Rename(Id id, std::string_view name, NMX::ENotify /*notify*/)
+{
+  const SubjectRecord* record = Record(id);
+  if (record == nullptr)
+    return EResult::InvalidId;
+  if (const IResult checked = CheckName(name, id); checked.Failed())
+    return checked;
+  if (record->Name() == name)
+    return EResult::Ok;
+  ForgetLatest();
+  m_draft.Rename(id, std::string(name));
+  return EResult::Ok;
+}
+
+IResult VEntryEditor::SetValue(Id id, NMX::EntryPath path, NMX::Value value, NMX::ENotify /*notify*/)
+{
+  const SubjectRecord* record = Record(id);
+  if (record == nullptr)
+    return EResult::InvalidId;
+  const SchemaEntry* entry = KindSchema::Of(record->kind).Find(path);
+  if (entry == nullptr)
+    return EResult::NotFound;
+  if (entry->writer == EWriter::StoreOnly)
+    return EResult::NotPermitted;
+  const bool empties = std::holds_alternative<std::monostate>(value);
+  if (empties ? entry->storage == EStorage::Bit : TypeOf(value) != entry->type)
+    return EResult::InvalidType;
+  if (path == NMX::Paths::Flags() || path == NMX::Paths::ParentSubjectId() ||
+      path == NMX::Paths::ParentSubjectSlotId())
+  {
+    if (empties)
+      return EResult::InvalidType;
+  }
+  if (path == NMX::Paths::Flags() && ((std::get<std::uint32_t>(value) ^ NMX::KindFlags(record->kind)) &
+                                      NMX::SubjectFlag::objectKindMask) != 0)
+    return EResult::InvalidValue;
+  if (record->Get(*entry) == value)
+    return EResult::Ok;
+
+  ForgetLatest();
+  if (path == NMX::Paths::ParentSubjectId())
+    return SetParent(id, std::get<Id>(value));
+  m_draft.Change(id, entry->aspect).Set(*entry, std::move(value));
+  return EResult::Ok;
+}
+
+IResult VEntryEditor::SetParent(Id id, Id parent)
+{
+  if (parent.Valid() && m_draft.Find(parent) == nullptr)
+    return EResult::InvalidId;
+  for (Id ancestor = parent; ancestor.Valid(); ancestor = m_draft.Find(ancestor)->Parent())
+    if (ancestor == id)
+      return EResult::InvalidValue;
+  MoveUnder(id, parent);
+  return EResult::Ok;
+}
+
+void VEntryEditor::MoveUnder(Id id, Id parent)
+{
+  SubjectRecord& record = m_draft.Change(id, EAspect::Parameters);
+  if (record.Parent().Valid())
+    RemoveChild(record.Parent(), id);
+  record.values[CommonValue::parent] = parent;
+  if (!parent.Valid())
+  {
+    record.values[CommonValue::parentSlot] = Id{};
+    return;
+  }
+  auto& siblings =
+      std::get<std::vector<Id>>(m_draft.Change(parent, EAspect::Parameters).values[CommonValue::children]);
+  siblings.insert(std::lower_bound(siblings.begin(), siblings.end(), id), id);
+}
+
+void VEntryEditor::RemoveChild(Id parent, Id child)
+{
+  auto& siblings =
+      std::get<std::vector<Id>>(m_draft.Change(parent, EAspect::Parameters).values[CommonValue::children]);
+  std::erase(siblings, child);
+}
+
+IResult VEntryEditor::SetApplicationEntry(NMX::EntryPath path, NMX::Value value)
+{
+  const NMX::Value* known = m_draft.FindApplicationEntry(path);
+  if (known != nullptr ? *known == value : std::holds_alternative<std::monostate>(value))
+    return EResult::Ok;
+  m_draft.SetApplicationEntry(path, std::move(value));
+  return EResult::Ok;
+}
+
+IResult VEntryEditor::Commit()
+{
+  if (!m_edit.owns_lock())
+    return EResult::NotAvailable;
+  DeriveDependents(m_draft);
+  ForgetLatest();
+  return m_committer.Commit(std::move(m_draft.Changes()), std::move(m_edit));
+}
+
+}

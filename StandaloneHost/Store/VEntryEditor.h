@@ -1,0 +1,54 @@
+#pragma once
+
+#include "StandaloneHost/Store/Draft.h"
+#include "StandaloneHost/Store/ReaderOperations.h"
+#include "StoreInterface/IEntryEditor.h"
+
+#include <mutex>
+
+namespace Store
+{
+
+/// Keeps a finished edit and tells whoever subscribed; the editor's way back into the store.
+class ICommitter
+{
+public:
+  /// `edit` is the editor's hold of the store, released before anyone is told.
+  virtual NMX::IResult Commit(ChangeSet&& changes, std::unique_lock<std::mutex> edit) = 0;
+
+protected:
+  ~ICommitter() = default;
+};
+
+/// Edit access: collects the changes in a draft.
+class VEntryEditor final : public ReaderOperations<NMX::IEntryEditor>
+{
+public:
+  VEntryEditor(const StoreState& state, std::mutex& editMutex, ICommitter& committer);
+
+  NMX::IResult Subjects(NMX::ESubjectKind kind, std::vector<Id>& ids) const override;
+  [[nodiscard]] const NMX::Value* FindApplicationEntry(NMX::EntryPath path) const override;
+  [[nodiscard]] std::vector<NMX::EntryPath> ApplicationEntries(NMX::EntryPath path) const override;
+
+  NMX::IResult Add(NMX::ESubjectKind kind, std::string_view name, Id& id) override;
+  NMX::IResult Remove(Id id) override;
+  NMX::IResult Rename(Id id, std::string_view name, NMX::ENotify notify) override;
+  NMX::IResult SetValue(Id id, NMX::EntryPath path, NMX::Value value, NMX::ENotify notify) override;
+  NMX::IResult SetApplicationEntry(NMX::EntryPath path, NMX::Value value) override;
+  NMX::IResult Commit() override;
+
+private:
+  const SubjectRecord* Lookup(std::string_view name) const override { return m_draft.Find(name); }
+  const SubjectRecord* Lookup(Id id) const override { return m_draft.Find(id); }
+
+  [[nodiscard]] NMX::IResult CheckName(std::string_view name, Id owner) const;
+  NMX::IResult SetParent(Id id, Id parent);
+  void MoveUnder(Id id, Id parent);
+  void RemoveChild(Id parent, Id child);
+
+  std::unique_lock<std::mutex> m_edit;
+  Draft m_draft;
+  ICommitter& m_committer;
+};
+
+}

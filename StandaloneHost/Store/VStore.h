@@ -1,0 +1,64 @@
+#pragma once
+
+#include "HostInterface/NMX/VShared.h"
+#include "HostInterface/NotificationSystem/VMultiCallbackPostal.h"
+#include "StandaloneHost/Store/StoreState.h"
+#include "StandaloneHost/Store/VEntryEditor.h"
+#include "StoreInterface/IStore.h"
+
+#include <array>
+#include <memory>
+#include <mutex>
+#include <shared_mutex>
+#include <vector>
+
+namespace Store
+{
+
+class IArchive;
+
+/// The standalone host's store: the state in memory, for readers; an archive that makes each commit last, when there is
+/// one; and the change callbacks. Readers share the state and never wait for the archive. [any]
+class VStore : public NMX::IStore, public NMX::VShared, private ICommitter
+{
+public:
+  /// Without an archive nothing is kept. Throws ArchiveError when the archive cannot be read.
+  explicit VStore(std::unique_ptr<IArchive> archive = nullptr);
+  ~VStore() override;
+
+  [[nodiscard]] std::unique_ptr<const NMX::IStoreReader> Reader() const override;
+  [[nodiscard]] std::unique_ptr<NMX::IEntryEditor> Editor() override;
+  [[nodiscard]] std::shared_ptr<ChangeCallback> SubjectsChanged(NMX::ESubjectKind kind) override;
+  [[nodiscard]] NMX::Subscription OnChange(std::string pattern, std::weak_ptr<NMX::IPostalService> postal,
+                                           std::function<void()> handler) override;
+
+  /// True when there is neither a subject nor an application entry.
+  [[nodiscard]] bool Empty() const;
+
+private:
+  using Callback = NotificationSystem::VMultiCallbackPostal<void()>;
+
+  /// A subscription to application entries.
+  struct PatternSubscription
+  {
+    std::string path;
+    bool beneath; ///< what lies beneath the path, rather than the path itself
+    std::shared_ptr<Callback> callback;
+    std::weak_ptr<const void> alive;
+  };
+
+  NMX::IResult Commit(ChangeSet&& changes, std::unique_lock<std::mutex> edit) override;
+  void TellSubjects(unsigned kinds);
+  void TellApplication(const std::vector<NMX::EntryPath>& paths);
+
+  // Lock order: m_editMutex before m_stateMutex; m_patternMutex alone.
+  std::mutex m_editMutex;
+  mutable std::shared_mutex m_stateMutex;
+  StoreState m_state; // written under both locks, so that the holder of either may read it
+  std::unique_ptr<IArchive> m_archive;
+  std::array<std::shared_ptr<Callback>, NMX::allSubjectKinds.size()> m_kindCallbacks;
+  std::mutex m_patternMutex;
+  std::vector<PatternSubscription> m_patterns;
+};
+
+}
