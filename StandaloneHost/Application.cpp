@@ -1,0 +1,112 @@
+#include "StandaloneHost/Application.h"
+
+#include "HostInterface/NMX/GlobalLog.h"
+#include "StandaloneHost/Files/SubjectConfiguration.h"
+#include "StandaloneHost/PluginModule.h"
+#include "StandaloneHost/Postal/VAsioPostalService.h"
+#include "StandaloneHost/Server/VServer.h"
+#include "StandaloneHost/Store/SqliteArchive.h"
+#include "StandaloneHost/Store/VStore.h"
+#include "StandaloneHost/VPluginHost.h"
+
+#include <csignal>
+#include <cstdio>
+#include <fstream>
+#include <system_error>
+#include <unistd.h>
+
+namespace
+{
+
+std::shared_ptr<Store::VStore> OpenStore(const Options& options)
+{
+  if (!options.dataFolder)
+    return NMX::MakeShared<Store::VStore>();
+  std::error_code error;
+  std::filesystem::create_directories(*options.dataFolder, error);
+  if (error)
+    throw Store::ArchiveError("cannot use the data folder \"" + options.dataFolder->string() + "\": " + error.message());
+  return NMX::MakeShared<Store::VStore>(std::make_unique<Store::SqliteArchive>(*options.dataFolder / "store.sqlite"));
+}
+
+void LoadConfigurations(Store::VStore& store, const Options& options)
+{
+  if (options.configurations.empty())
+    return;
+  if (!store.Empty())
+  {
+    NMX::Log(NMX::systemLog, NMX::ESeverity::Notice, "The store has content; no configuration was loaded.");
+    return;
+  }
+  const auto loaded = Files::LoadSubjectConfigurations(store, options.configurations);
+  NMX::Log(NMX::systemLog, NMX::ESeverity::Notice, "Loaded %1% subjects, %2% devices and %3% presets.", loaded.subjects,
+           loaded.devices, loaded.presets);
+}
+
+/// Tells whoever started the host that calls are served. The file appears whole.
+void WriteReadyFile(const std::filesystem::path& file, const std::string& address)
+{
+  if (file.empty())
+    return;
+  std::filesystem::path unfinished = file;
+  unfinished += ".unfinished";
+  {
+    std::ofstream out(unfinished);
+    out << "{\"url\": \"http://" << address << "\", \"ws\": \"ws://" << address << "/rpc\", \"pid\": " << getpid()
+        << "}\n";
+    out.flush();
+    if (!out)
+      throw std::runtime_error("cannot write the ready file \"" + file.string() + "\"");
+  }
+  std::filesystem::rename(unfinished, file);
+}
+
+void WaitForSignal()
+{
+  sigset_t signals;
+  sigemptyset(&signals);
+  sigaddset(&signals, SIGINT);
+  sigaddset(&signals, SIGTERM);
+  int received = 0;
+  sigwait(&signals, &received);
+}
+
+/// The order matters: clients go first, then what serves them, then the plugin, and the store last.
+void Stop(Server::VServer& server, Postal::VAsioPostalService& postal, PluginPointer plugin,
+          std::shared_ptr<Store::VStore> store)
+{
+  server.Close();          // no client, no outstanding call, no function any more
+  postal.Stop();           // the strands have run empty
+  plugin->UnregisterQml();
+  plugin.reset();
+  store.reset();
+}
+
+}
+
+void RunApplication(const Options& options)
+{
+  auto store = OpenStore(options);
+  LoadConfigurations(*store, options);
+  PluginPointer plugin = LoadPlugin(options.pluginFile.empty() ? OwnPluginFile() : options.pluginFile);
+
+  const auto postal = NMX::MakeShared<Postal::VAsioPostalService>();
+  const auto server = NMX::MakeShared<Server::VServer>(postal, options.server);
+  try
+  {
+    VPluginHost host({store, postal, server, std::make_shared<VPluginSettings>(options.features)});
+    (void)plugin->RegisterServices(host);
+    plugin->RegistrationFinished();
+    server->Open();
+    WriteReadyFile(options.readyFile, server->Address());
+    std::printf("listening on http://%s and ws://%s/rpc\n", server->Address().c_str(), server->Address().c_str());
+    std::fflush(stdout);
+    WaitForSignal();
+  }
+  catch (...)
+  {
+    Stop(*server, *postal, std::move(plugin), std::move(store));
+    throw;
+  }
+  Stop(*server, *postal, std::move(plugin), std::move(store));
+}

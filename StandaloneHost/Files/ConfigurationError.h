@@ -1,0 +1,44 @@
+#pragma once
+
+#include <cstdint>
+#include <filesystem>
+#include <span>
+#include <stdexcept>
+#include <string>
+#include <string_view>
+
+namespace Files
+{
+
+/// Why a subject configuration could not be loaded, as one line for people:
+/// "FILE:LINE:COLUMN: what is wrong, what was expected".
+class ConfigurationError : public std::runtime_error
+{
+public:
+  using std::runtime_error::runtime_error;
+};
+
+/// Where something stands in a file. Lines and columns count from 1, columns in characters.
+struct Place
+{
+  const std::filesystem::path* file; ///< outlives the place
+  std::uint32_t line = 1;
+  std::uint32_t column = 1;
+};
+
+/// "FILE:LINE:COLUMN".
+[[nodiscard]] std::string PlaceText(const Place& place);
+
+/// Throws the ConfigurationError that tells of a problem at a place.
+[[noreturn]] void Fail(const Place& place, std::string_view problem);
+
+/// Text of a file as messages quote it; what is too long is cut.
+[[nodiscard]] std::string Quoted(std::string_view text);
+
+/// The tag of an element as messages name it.
+[[nodiscard]] std::string Tag(std::string_view name);
+
+/// "expected A", "expected one of A, B" or "expected none"; a long list is cut.
+[[nodiscard]] std::string Expected(std::span<const std::string_view> names);
+
+}

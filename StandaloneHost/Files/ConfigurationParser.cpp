@@ -1,0 +1,250 @@
+#include "StandaloneHost/Files/ConfigurationParser.h"
+
+#include "StandaloneHost/Files/ElementReader.h"
+#include "StandaloneHost/Files/EntryTree.h"
+#include "StandaloneHost/Files/ValueText.h"
+
+#include <algorithm>
+#include <array>
+#include <functional>
+#include <map>
+#include <utility>
+
+namespace Files
+{
+
+using NMX::EValueType;
+
+namespace
+{
+
+/// Notices what may stand only once among its siblings.
+class Once
+{
+public:
+  /// `what` names the thing in messages, `key` tells it from others.
+  void Check(const Place& place, std::string_view what, std::string_view key)
+  {
+    const auto [known, added] = m_places.emplace(key, place);
+    if (!added)
+      Fail(place, "repeated " + std::string(what) + ", expected it once (first at " + PlaceText(known->second) + ")");
+  }
+
+private:
+  std::map<std::string, Place, std::less<>> m_places;
+};
+
+template <class T>
+T ReadAttribute(const Element& element, std::string_view attribute)
+{
+  return ReadAs<T>(element.place, "attribute " + Quoted(attribute) + " of " + Tag(element.name),
+                   element.RequiredAttribute(attribute));
+}
+
+std::string OptionalAttribute(const Element& element, std::string_view attribute)
+{
+  const std::string* text = element.Attribute(attribute);
+  return text != nullptr ? *text : std::string{};
+}
+
+class Parser
+{
+public:
+  Parser(const std::filesystem::path& file, ConfigurationContent& content) : m_xml(file), m_content(content) {}
+
+  void Parse();
+
+private:
+  /// Reads each child of the element that was entered last; all have that name.
+  template <class ReadChild>
+  void ForEachChild(std::string_view name, ReadChild readChild);
+
+  void ReadDevice(const Element& element);
+  void ReadPreset(const Element& element);
+  void ReadSubject(const Element& element);
+  void ReadEntries(const EntryNode& node, std::vector<EntryContent>& entries, std::vector<FillingContent>& fillings);
+  NMX::Value ReadEntry(const Element& element, EValueType type, std::vector<FillingContent>& fillings);
+  std::vector<NMX::Position> ReadMarkers();
+  std::vector<NMX::SmartCluster> ReadClusters();
+  std::vector<NMX::Slot> ReadSlots(std::vector<FillingContent>& fillings);
+
+  ElementReader m_xml;
+  ConfigurationContent& m_content;
+};
+
+template <class ReadChild>
+void Parser::ForEachChild(std::string_view name, ReadChild readChild)
+{
+  while (const auto child = m_xml.EnterChild())
+  {
+    if (child->name != name)
+      FailUnknown(*child, {&name, 1});
+    readChild(*child);
+  }
+}
+
+void Parser::Parse()
+{
+  const Element root = m_xml.EnterRoot("SubjectConfiguration");
+  root.AllowAttributes({"version"});
+  if (const std::string& version = root.RequiredAttribute("version"); version != "1")
+    Fail(root.place, "the version is " + Quoted(version) + ", expected 1");
+
+  constexpr std::array<std::string_view, 3> sections{"Devices", "Presets", "Subjects"};
+  Once once;
+  while (const auto section = m_xml.EnterChild())
+  {
+    if (std::find(sections.begin(), sections.end(), section->name) == sections.end())
+      FailUnknown(*section, sections);
+    once.Check(section->place, Tag(section->name), section->name);
+    section->AllowAttributes({});
+    if (section->name == "Devices")
+      ForEachChild("Device", [this](const Element& element) { ReadDevice(element); });
+    else if (section->name == "Presets")
+      ForEachChild("Preset", [this](const Element& element) { ReadPreset(element); });
+    else
+      ForEachChild("Subject", [this](const Element& element) { ReadSubject(element); });
+  }
+  m_xml.End();
+}
+
+void Parser::ReadDevice(const Element& element)
+{
+  element.AllowAttributes({"urn", "type", "connected", "charging", "battery", "radio"});
+  DeviceContent device{element.place,
+                       element.FilledAttribute("urn"),
+                       element.FilledAttribute("type"),
+                       ReadAttribute<bool>(element, "connected"),
+                       ReadAttribute<bool>(element, "charging"),
+                       ReadAttribute<std::uint32_t>(element, "battery"),
+                       ReadAttribute<std::uint32_t>(element, "radio")};
+  if (device.urn.find('/') != std::string::npos)
+    Fail(element.place, "the urn is " + Quoted(device.urn) + ", expected a text without \"/\"");
+  if (device.battery > 100)
+    Fail(element.place, "the battery has " + std::to_string(device.battery) + " percent, expected at most 100");
+  m_xml.LeaveEmpty();
+  m_content.devices.push_back(std::move(device));
+}
+
+void Parser::ReadPreset(const Element& element)
+{
+  element.AllowAttributes({"id", "name", "readOnly"});
+  PresetContent preset{element.place,
+                       ReadAttribute<std::uint32_t>(element, "id"),
+                       element.FilledAttribute("name"),
+                       ReadAttribute<bool>(element, "readOnly"),
+                       {}};
+  if (preset.id == 0)
+    Fail(element.place, "the id of the preset is 0, expected at least 1");
+  std::vector<FillingContent> none;
+  ReadEntries(PresetParameters(), preset.parameters, none);
+  m_content.presets.push_back(std::move(preset));
+}
+
+void Parser::ReadSubject(const Element& element)
+{
+  element.AllowAttributes({"kind", "name", "parent"});
+  const std::string& key = element.RequiredAttribute("kind");
+  const auto kind = NMX::KindFromKey(key);
+  if (!kind)
+  {
+    std::array<std::string_view, NMX::allSubjectKinds.size()> keys;
+    std::transform(NMX::allSubjectKinds.begin(), NMX::allSubjectKinds.end(), keys.begin(), NMX::KindKey);
+    Fail(element.place, "the kind is " + Quoted(key) + ", " + Expected(keys));
+  }
+  SubjectContent subject{element.place, *kind, element.RequiredAttribute("name"), {}, {}, {}};
+  if (element.Attribute("parent") != nullptr)
+    subject.parent = element.FilledAttribute("parent");
+  ReadEntries(EntriesOf(*kind), subject.entries, subject.fillings);
+  m_content.subjects.push_back(std::move(subject));
+}
+
+void Parser::ReadEntries(const EntryNode& node, std::vector<EntryContent>& entries,
+                         std::vector<FillingContent>& fillings)
+{
+  Once once;
+  while (const auto element = m_xml.EnterChild())
+  {
+    const EntryNode* child = node.Find(element->name);
+    if (child == nullptr)
+      FailUnknown(*element, node.ChildNames());
+    once.Check(element->place, Tag(element->name), element->name);
+    element->AllowAttributes({});
+    if (child->entry == nullptr)
+      ReadEntries(*child, entries, fillings);
+    else
+      entries.push_back({element->place, child->entry->path, ReadEntry(*element, child->entry->type, fillings)});
+  }
+}
+
+NMX::Value Parser::ReadEntry(const Element& element, EValueType type, std::vector<FillingContent>& fillings)
+{
+  switch (type)
+  {
+  case EValueType::Positions:
+    return ReadMarkers();
+  case EValueType::SmartClusters:
+    return ReadClusters();
+  case EValueType::Slots:
+    return ReadSlots(fillings);
+  default:
+    return ReadValue(type, element.place, Tag(element.name), m_xml.LeaveWithText());
+  }
+}
+
+std::vector<NMX::Position> Parser::ReadMarkers()
+{
+  std::vector<NMX::Position> markers;
+  ForEachChild("Marker",
+               [&](const Element& element)
+               {
+                 element.AllowAttributes({"x", "y", "z"});
+                 markers.push_back({ReadAttribute<double>(element, "x"), ReadAttribute<double>(element, "y"),
+                                    ReadAttribute<double>(element, "z")});
+                 m_xml.LeaveEmpty();
+               });
+  return markers;
+}
+
+std::vector<NMX::SmartCluster> Parser::ReadClusters()
+{
+  std::vector<NMX::SmartCluster> clusters;
+  ForEachChild("SmartCluster",
+               [&](const Element& element)
+               {
+                 element.AllowAttributes({"label", "device", "pattern", "type"});
+                 clusters.push_back({element.FilledAttribute("label"), OptionalAttribute(element, "device"),
+                                     ReadAttribute<std::uint32_t>(element, "pattern"),
+                                     element.FilledAttribute("type")});
+                 m_xml.LeaveEmpty();
+               });
+  return clusters;
+}
+
+std::vector<NMX::Slot> Parser::ReadSlots(std::vector<FillingContent>& fillings)
+{
+  std::vector<NMX::Slot> slots;
+  Once once;
+  ForEachChild("Slot",
+               [&](const Element& element)
+               {
+                 element.AllowAttributes({"name", "object"});
+                 const std::string& name = element.FilledAttribute("name");
+                 once.Check(element.place, "slot " + Quoted(name), name);
+                 const NMX::TSubjectStoreId id(slots.size() + 1);
+                 slots.push_back({id, name});
+                 if (element.Attribute("object") != nullptr)
+                   fillings.push_back({element.place, id, element.FilledAttribute("object")});
+                 m_xml.LeaveEmpty();
+               });
+  return slots;
+}
+
+}
+
+void ParseConfiguration(const std::filesystem::path& file, ConfigurationContent& content)
+{
+  Parser(file, content).Parse();
+}
+
+}

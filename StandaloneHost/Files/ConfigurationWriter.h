@@ -1,0 +1,13 @@
+#pragma once
+
+#include "StandaloneHost/Files/ConfigurationContent.h"
+#include "StoreInterface/IEntryEditor.h"
+
+namespace Files
+{
+
+/// Adds the content to the edited store; does not commit. Throws ConfigurationError when parts of the content
+/// contradict each other or what the store holds. [any]
+void WriteConfiguration(const ConfigurationContent& content, NMX::IEntryEditor& editor);
+
+}

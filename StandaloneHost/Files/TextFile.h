@@ -1,0 +1,17 @@
+#pragma once
+
+#include <cstddef>
+#include <filesystem>
+#include <string>
+
+namespace Files
+{
+
+/// What a file may have at most.
+inline constexpr std::size_t maximumFileBytes = std::size_t{64} << 20;
+
+/// The content of a file as UTF-8, without byte order mark. Throws ConfigurationError when there is no such file or
+/// it cannot be read, is no regular file, is too large, empty, or not UTF-8.
+[[nodiscard]] std::string ReadTextFile(const std::filesystem::path& file);
+
+}

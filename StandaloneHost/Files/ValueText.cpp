@@ -1,0 +1,114 @@
+#include "StandaloneHost/Files/ValueText.h"
+
+#include "StoreInterface/WideText.h"
+
+#include <charconv>
+#include <cmath>
+#include <optional>
+#include <system_error>
+
+namespace Files
+{
+
+using NMX::EValueType;
+
+namespace
+{
+
+using Read = std::optional<NMX::Value>;
+
+Read ReadBool(std::string_view text)
+{
+  if (text == "true")
+    return true;
+  if (text == "false")
+    return false;
+  return std::nullopt;
+}
+
+template <class Number>
+Read ReadNumber(std::string_view text)
+{
+  Number number{};
+  const char* end = text.data() + text.size();
+  const auto [stop, error] = std::from_chars(text.data(), end, number);
+  if (error != std::errc{} || stop != end)
+    return std::nullopt;
+  return number;
+}
+
+Read ReadDouble(std::string_view text)
+{
+  const Read number = ReadNumber<double>(text);
+  return number && std::isfinite(std::get<double>(*number)) ? number : std::nullopt;
+}
+
+Read ReadText(std::string_view text)
+{
+  return std::string(text);
+}
+
+Read ReadWideText(std::string_view text)
+{
+  if (auto wide = NMX::ToWide(text))
+    return *std::move(wide);
+  return std::nullopt;
+}
+
+Read ReadColour(std::string_view text)
+{
+  if ((text.size() != 7 && text.size() != 9) || text.front() != '#')
+    return std::nullopt;
+  const char* end = text.data() + text.size();
+  std::uint32_t bits = 0;
+  const auto [stop, error] = std::from_chars(text.data() + 1, end, bits, 16);
+  if (error != std::errc{} || stop != end)
+    return std::nullopt;
+  const auto channel = [bits](unsigned shift) { return static_cast<std::uint8_t>(bits >> shift); };
+  return NMX::Colour{channel(16), channel(8), channel(0), text.size() == 9 ? channel(24) : std::uint8_t{255}};
+}
+
+/// How a value type is written.
+struct Form
+{
+  EValueType type;
+  Read (*read)(std::string_view);
+  std::string_view expected;
+};
+
+constexpr Form forms[] = {
+    {EValueType::Bool, ReadBool, "true or false"},
+    {EValueType::Int32, ReadNumber<std::int32_t>, "a whole number from -2147483648 to 2147483647"},
+    {EValueType::UInt32, ReadNumber<std::uint32_t>, "a whole number from 0 to 4294967295"},
+    {EValueType::UInt64, ReadNumber<std::uint64_t>, "a whole number from 0 to 18446744073709551615"},
+    {EValueType::Double, ReadDouble, "a finite number"},
+    {EValueType::Text, ReadText, "a text"},
+    {EValueType::WideText, ReadWideText, "a text"},
+    {EValueType::Colour, ReadColour, "#AARRGGBB or #RRGGBB"},
+};
+
+const Form* Find(EValueType type)
+{
+  for (const Form& form : forms)
+    if (form.type == type)
+      return &form;
+  return nullptr;
+}
+
+}
+
+bool HasText(EValueType type)
+{
+  return Find(type) != nullptr;
+}
+
+NMX::Value ReadValue(EValueType type, const Place& place, std::string_view what, std::string_view text)
+{
+  const Form& form = *Find(type);
+  Read value = form.read(text);
+  if (!value)
+    Fail(place, std::string(what) + " is " + Quoted(text) + ", expected " + std::string(form.expected));
+  return *std::move(value);
+}
+
+}

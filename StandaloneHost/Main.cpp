@@ -1,0 +1,46 @@
+#include "StandaloneHost/Application.h"
+
+#include <csignal>
+#include <cstdio>
+#include <exception>
+
+namespace
+{
+
+/// Exit status for whatever keeps the host from starting.
+constexpr int cannotStart = 2;
+
+/// SIGINT and SIGTERM are waited for, not handled: no thread is interrupted by them.
+void BlockSignals()
+{
+  sigset_t signals;
+  sigemptyset(&signals);
+  sigaddset(&signals, SIGINT);
+  sigaddset(&signals, SIGTERM);
+  pthread_sigmask(SIG_BLOCK, &signals, nullptr);
+  std::signal(SIGPIPE, SIG_IGN);
+}
+
+}
+
+int main(int argumentCount, char** arguments)
+{
+  try
+  {
+    BlockSignals();
+    const Request request = ReadOptions(argumentCount, arguments);
+    if (request.help)
+    {
+      std::fputs(request.helpText.c_str(), stdout);
+      return 0;
+    }
+    NMX::GlobalLog::SetLevel(request.options.logLevel);
+    RunApplication(request.options);
+    return 0;
+  }
+  catch (const std::exception& failure)
+  {
+    std::fprintf(stderr, "subject-store-host: %s\n", failure.what());
+    return cannotStart;
+  }
+}

@@ -1,0 +1,29 @@
+#pragma once
+
+#include "StandaloneHost/Server/VServer.h"
+
+#include <string_view>
+
+namespace Server
+{
+
+/// The parts of a request that decide whether it is let in.
+struct Visitor
+{
+  std::string_view host;          ///< header Host
+  std::string_view origin;        ///< header Origin; empty unless a web page asks
+  std::string_view authorisation; ///< header Authorization
+};
+
+enum class EAdmission
+{
+  Welcome,
+  NoToken,      ///< a token is required and was not presented
+  WrongOrigin,  ///< a web page from elsewhere
+  WrongHost     ///< a name that is not this machine's: a web page whose name was made to point here
+};
+
+/// Decides whether a request is let in. Nothing of the request has been carried out yet. [any]
+[[nodiscard]] EAdmission Admit(const Visitor& visitor, const ServerOptions& options);
+
+}

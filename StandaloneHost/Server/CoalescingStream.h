@@ -1,0 +1,183 @@
+#pragma once
+
+#include <boost/asio/io_context.hpp>
+#include <boost/asio/ip/tcp.hpp>
+#include <boost/asio/post.hpp>
+#include <boost/asio/write.hpp>
+#include <boost/beast/core/bind_handler.hpp>
+#include <boost/beast/core/role.hpp>
+#include <boost/beast/websocket/teardown.hpp>
+
+#include <cstddef>
+#include <functional>
+#include <memory>
+#include <string>
+#include <utility>
+
+namespace Server
+{
+
+/// A TCP socket on a concrete executor: a type-erased one costs at each operation.
+using Socket = boost::asio::basic_stream_socket<boost::asio::ip::tcp, boost::asio::io_context::executor_type>;
+
+/// A stream between a WebSocket and its socket that gathers small writes into few large ones, because one system call
+/// for each message costs more than all the rest of answering it.
+///
+/// A write is done as soon as it has been copied. What has gathered is sent when the reader asks the socket for more
+/// (then everything received so far has been worked through), when Flush is called, or when much has gathered. A write
+/// that comes while too much is still being sent waits. [server]
+class CoalescingStream
+{
+public:
+  using executor_type = boost::asio::io_context::executor_type;
+  using next_layer_type = Socket;
+  using error_code = boost::system::error_code;
+
+  explicit CoalescingStream(Socket socket) : m_state(std::make_shared<State>(std::move(socket))) {}
+  CoalescingStream(CoalescingStream&&) = default;
+  CoalescingStream& operator=(CoalescingStream&&) = default;
+
+  ~CoalescingStream()
+  {
+    if (m_state)
+    {
+      error_code ignored;
+      m_state->socket.close(ignored);
+    }
+  }
+
+  executor_type get_executor() noexcept { return m_state->socket.get_executor(); }
+  next_layer_type& next_layer() { return m_state->socket; }
+  const next_layer_type& next_layer() const { return m_state->socket; }
+
+  /// True while the reader waits for the socket: nothing that was received is still to be worked on.
+  [[nodiscard]] bool InputDrained() const { return m_state->inputDrained; }
+
+  /// To be called when a message has arrived.
+  void InputArrived() { m_state->inputDrained = false; }
+
+  /// Sends what has gathered.
+  void Flush() { State::Flush(m_state); }
+
+  template <class Buffers, class Handler>
+  auto async_read_some(const Buffers& buffers, Handler&& handler)
+  {
+    m_state->inputDrained = true;
+    Flush();
+    return m_state->socket.async_read_some(buffers, std::forward<Handler>(handler));
+  }
+
+  template <class Buffers, class Handler>
+  auto async_write_some(const Buffers& buffers, Handler&& handler)
+  {
+    return boost::asio::async_initiate<Handler, void(error_code, std::size_t)>(
+        [](auto completion, State& state, const Buffers& data) { state.Gather(data, std::move(completion)); }, handler,
+        *m_state, buffers);
+  }
+
+  /// Calls `task(socket)` once nothing waits to be sent any more.
+  template <class Task>
+  void WhenDrained(Task task)
+  {
+    m_state->whenDrained = [socket = &m_state->socket, task = std::move(task)]() mutable { task(*socket); };
+    if (m_state->sending || !m_state->gathered.empty())
+      Flush();
+    else
+      boost::asio::post(get_executor(), [state = m_state] { State::OnSent(state, state->error); });
+  }
+
+private:
+  static constexpr std::size_t sendAt = std::size_t{64} << 10;
+  static constexpr std::size_t waitAt = std::size_t{256} << 10;
+
+  struct State : std::enable_shared_from_this<State>
+  {
+    explicit State(Socket s) : socket(std::move(s)) {}
+
+    template <class Buffers, class Completion>
+    void Gather(const Buffers& buffers, Completion completion)
+    {
+      if (gathered.size() > waitAt && !error)
+      {
+        // The buffers stay valid until the completion is called.
+        auto waiting = std::make_shared<Completion>(std::move(completion));
+        whenRoom = [this, buffers, waiting] { Gather(buffers, std::move(*waiting)); };
+        Flush(shared_from_this());
+        return;
+      }
+      const std::size_t size = error ? 0 : Append(buffers);
+      if (gathered.size() >= sendAt)
+        Flush(shared_from_this());
+      boost::asio::post(socket.get_executor(),
+                        boost::beast::bind_front_handler(std::move(completion), error, size));
+    }
+
+    template <class Buffers>
+    std::size_t Append(const Buffers& buffers)
+    {
+      const std::size_t before = gathered.size();
+      const auto end = boost::asio::buffer_sequence_end(buffers);
+      for (auto it = boost::asio::buffer_sequence_begin(buffers); it != end; ++it)
+      {
+        const boost::asio::const_buffer part = *it;
+        gathered.append(static_cast<const char*>(part.data()), part.size());
+      }
+      return gathered.size() - before;
+    }
+
+    static void Flush(const std::shared_ptr<State>& state)
+    {
+      if (state->sending || state->gathered.empty())
+        return;
+      state->sending = true;
+      state->sent.swap(state->gathered);
+      boost::asio::async_write(state->socket, boost::asio::buffer(state->sent),
+                               [state](error_code failed, std::size_t) { OnSent(state, failed); });
+    }
+
+    static void OnSent(const std::shared_ptr<State>& state, error_code failed)
+    {
+      state->sending = false;
+      state->sent.clear();
+      if (failed)
+      {
+        state->error = failed;
+        state->gathered.clear();
+      }
+      Flush(state);
+      if (state->gathered.empty())
+        if (const auto task = std::exchange(state->whenRoom, nullptr))
+          task();
+      if (!state->sending && state->gathered.empty())
+        if (const auto task = std::exchange(state->whenDrained, nullptr))
+          task();
+    }
+
+    Socket socket;
+    std::string gathered;
+    std::string sent;
+    bool sending = false;
+    bool inputDrained = false;
+    error_code error;
+    std::function<void()> whenRoom;    // a write that waits; Beast has one at a time
+    std::function<void()> whenDrained; // the end of the stream
+  };
+
+  std::shared_ptr<State> m_state;
+};
+
+/// Beast's hook for the end of a WebSocket over this stream: what waits is sent first.
+template <class Handler>
+void async_teardown(boost::beast::role_type role, CoalescingStream& stream, Handler&& handler)
+{
+  auto held = std::make_shared<std::decay_t<Handler>>(std::forward<Handler>(handler));
+  stream.WhenDrained([role, held](Socket& socket)
+                     { boost::beast::websocket::async_teardown(role, socket, std::move(*held)); });
+}
+
+inline void teardown(boost::beast::role_type role, CoalescingStream& stream, boost::system::error_code& error)
+{
+  boost::beast::websocket::teardown(role, stream.next_layer(), error);
+}
+
+}

@@ -1,0 +1,294 @@
+#include "StandaloneHost/Server/Dispatcher.h"
+
+#include "StandaloneHost/Server/Description.h"
+#include "StandaloneHost/Server/JsonText.h"
+
+#include <algorithm>
+#include <utility>
+
+namespace Server
+{
+
+using NMX::EResult;
+using NMX::IResult;
+
+namespace
+{
+
+void AppendHead(std::string& json, std::string_view id)
+{
+  json += "{\"jsonrpc\":\"2.0\",\"id\":";
+  json += id;
+}
+
+std::string RpcErrorText(std::string_view id, int code, std::string_view message)
+{
+  std::string json;
+  AppendHead(json, id);
+  json += ",\"error\":{\"code\":";
+  AppendNumber(json, std::int64_t{code});
+  json += ",\"message\":";
+  AppendString(json, message);
+  json += "}}";
+  return json;
+}
+
+void AppendCodeAndName(std::string& json, IResult result)
+{
+  json += "{\"code\":";
+  AppendNumber(json, std::uint64_t{result.Code()});
+  json += ",\"name\":";
+  AppendString(json, result.Name());
+}
+
+std::string FailureText(std::string_view id, IResult result, std::string_view meaning, std::string_view detail)
+{
+  std::string json;
+  json.reserve(192 + meaning.size() + detail.size());
+  AppendHead(json, id);
+  json += ",\"error\":{\"code\":";
+  AppendNumber(json, std::int64_t{static_cast<std::int32_t>(result.Code())});
+  json += ",\"message\":";
+  AppendString(json, result.Name());
+  json += ",\"data\":{\"code\":";
+  AppendNumber(json, std::uint64_t{result.Code()});
+  json += ",\"text\":";
+  AppendString(json, meaning);
+  if (!detail.empty())
+  {
+    json += ",\"detail\":";
+    AppendString(json, detail);
+  }
+  json += "}}}";
+  return json;
+}
+
+std::string ReplyText(std::string_view id, const FunctionEntry& entry, const NMX::IServerReply& reply)
+{
+  const IResult result = reply.Result();
+  if (result.Failed())
+    return FailureText(id, result, entry.Meaning(result), reply.Text());
+
+  std::string json;
+  json.reserve(128);
+  AppendHead(json, id);
+  json += ",\"result\":";
+  AppendCodeAndName(json, result);
+  json += ",\"outputs\":{";
+  MemberWriter writer(json, entry.outputs);
+  reply.WriteOutputs(writer);
+  json += '}';
+  if (const auto returned = reply.Returned())
+    json += *returned ? ",\"returned\":true" : ",\"returned\":false";
+  json += "}}";
+  return json;
+}
+
+/// The values of by-name params in the order of `names`, as an array; or what is wrong with them.
+std::optional<Complaint> OrderByName(std::string_view object, std::span<const std::string_view> names,
+                                     const Limits& limits, std::string& array)
+{
+  const auto complain = [](std::string text) { return Complaint{RpcError::invalidParams, std::move(text)}; };
+  std::vector<std::string_view> values(names.size());
+  for (const auto& [name, value] : ReadMembers(object, limits))
+  {
+    const auto place = std::find(names.begin(), names.end(), name);
+    if (place == names.end())
+      return complain("Unknown parameter \"" + name + '"');
+    auto& slot = values[static_cast<std::size_t>(place - names.begin())];
+    if (!slot.empty())
+      return complain("Parameter \"" + name + "\" is given twice");
+    slot = value;
+  }
+  array = "[";
+  for (std::size_t i = 0; i < values.size(); ++i)
+  {
+    if (values[i].empty())
+      return complain("Parameter \"" + std::string(names[i]) + "\" is missing");
+    if (i != 0)
+      array += ',';
+    array += values[i];
+  }
+  array += ']';
+  return std::nullopt;
+}
+
+/// Gathers the answers to the calls of a batch.
+struct Batch
+{
+  std::string text = "[";
+  std::size_t open;
+  std::size_t calls;
+  Answer answer;
+
+  void Take(std::string part)
+  {
+    if (!part.empty())
+    {
+      if (text.size() > 1)
+        text += ',';
+      text += part;
+    }
+    if (--open == 0)
+      answer(text.size() > 1 ? text + ']' : std::string{}, calls);
+  }
+};
+
+}
+
+Dispatcher::Dispatcher(const Registry& registry, Notifier& notifier, const Limits& limits,
+                       TerminalServer2::Level grantedLevel, std::string epoch)
+    : m_registry(registry), m_notifier(notifier), m_limits(limits), m_grantedLevel(grantedLevel),
+      m_epoch(std::move(epoch))
+{
+}
+
+const std::string& Dispatcher::Description() const
+{
+  if (m_description.empty())
+    m_description = DescribeApi(m_registry);
+  return m_description;
+}
+
+std::string Dispatcher::Hello(std::uint64_t session) const
+{
+  std::string json = "{\"jsonrpc\":\"2.0\",\"method\":\"Server.Hello\",\"params\":{\"session\":";
+  AppendNumber(json, session);
+  json += ",\"epoch\":";
+  AppendString(json, m_epoch);
+  const std::pair<std::string_view, std::size_t> limits[] = {
+      {"messageBytes", m_limits.messageBytes},   {"nesting", m_limits.nesting},
+      {"batchCalls", m_limits.batchCalls},       {"connections", m_limits.connections},
+      {"subscriptions", m_limits.subscriptions}, {"callsInFlight", m_limits.callsInFlight},
+      {"outgoingBytes", m_limits.outgoingBytes}, {"outgoingNotifications", m_limits.outgoingNotifications}};
+  char separator = '{';
+  json += ",\"limits\":";
+  for (const auto& [name, limit] : limits)
+  {
+    json += separator;
+    separator = ',';
+    AppendString(json, name);
+    json += ':';
+    AppendNumber(json, std::uint64_t{limit});
+  }
+  json += "},\"levels\":{\"open\":2,\"preview\":1,\"granted\":";
+  AppendNumber(json, std::uint64_t{m_grantedLevel});
+  json += "}}}";
+  return json;
+}
+
+std::size_t Dispatcher::Handle(std::string_view text, IListener* listener, Answer answer)
+{
+  const Message message = ReadMessage(text, m_limits);
+  if (message.complaint)
+  {
+    answer(RpcErrorText("null", message.complaint->code, message.complaint->text), 1);
+    return 1;
+  }
+  const std::size_t calls = message.requests.size();
+  if (!message.batch)
+  {
+    HandleRequest(message.requests.front(), listener,
+                  [answer = std::move(answer)](std::string reply) { answer(std::move(reply), 1); });
+    return 1;
+  }
+  const auto batch = std::make_shared<Batch>();
+  batch->open = calls;
+  batch->calls = calls;
+  batch->answer = std::move(answer);
+  for (const Request& request : message.requests)
+    HandleRequest(request, listener, [batch](std::string reply) { batch->Take(std::move(reply)); });
+  return calls;
+}
+
+void Dispatcher::HandleRequest(const Request& request, IListener* listener, Reply reply)
+{
+  const bool notification = request.id.empty();
+  const auto answerNow = [&](std::string text) { reply(notification ? std::string{} : std::move(text)); };
+
+  if (request.complaint)
+    reply(RpcErrorText(request.id, request.complaint->code, request.complaint->text));
+  else if (const FunctionEntry* entry = m_registry.FindFunction(request.method))
+  {
+    if (entry->level < m_grantedLevel)
+      answerNow(FailureText(request.id, EResult::NotPermitted, entry->Meaning(EResult::NotPermitted),
+                            "a preview function; the host opens these with --level 1"));
+    else
+      Call(*entry, request, std::move(reply));
+  }
+  else
+    answerNow(CallServer(request, listener));
+}
+
+void Dispatcher::Call(const FunctionEntry& entry, const Request& request, Reply reply)
+{
+  std::string ordered;
+  std::string_view arguments = request.params;
+  if (arguments.front() == '{')
+  {
+    if (const auto complaint = OrderByName(arguments, entry.inputs, m_limits, ordered))
+    {
+      reply(request.id.empty() ? std::string{} : RpcErrorText(request.id, complaint->code, complaint->text));
+      return;
+    }
+    arguments = ordered;
+  }
+  // The entry stays until every call has been finished.
+  entry.function->Invoke(arguments,
+                         [id = std::string(request.id), &entry, reply = std::move(reply)](
+                             const NMX::IServerReply& finished)
+                         { reply(id.empty() ? std::string{} : ReplyText(id, entry, finished)); });
+}
+
+std::string Dispatcher::CallServer(const Request& request, IListener* listener)
+{
+  const bool describe = request.method == "rpc.discover";
+  if (describe)
+  {
+    std::string json;
+    AppendHead(json, request.id);
+    json += ",\"result\":" + Description() + '}';
+    return json;
+  }
+  if (request.method == "Server.Subscribe" || request.method == "Server.Unsubscribe")
+    return Subscription(request, listener);
+  return RpcErrorText(request.id, RpcError::methodNotFound, "Method not found: \"" + request.method + '"');
+}
+
+std::string Dispatcher::Subscription(const Request& request, IListener* listener)
+{
+  static constexpr std::string_view parameter[] = {"Name"};
+  std::string ordered(request.params);
+  if (request.params.front() == '{')
+    if (const auto complaint = OrderByName(request.params, parameter, m_limits, ordered))
+      return RpcErrorText(request.id, complaint->code, complaint->text);
+  const auto texts = ReadTexts(ordered);
+  if (!texts || texts->size() != 1)
+    return RpcErrorText(request.id, RpcError::invalidParams,
+                        "expected one text: the name of a callback, or of a group with \".*\"");
+  if (listener == nullptr)
+    return FailureText(request.id, EResult::NotSupported, "Notifications need a WebSocket.", {});
+
+  const IResult result = request.method == "Server.Subscribe"
+                             ? m_notifier.Subscribe(texts->front(), *listener, m_grantedLevel)
+                             : m_notifier.Unsubscribe(texts->front(), *listener);
+  if (result == EResult::NotFound)
+    return FailureText(request.id, result, "No callback with that name.", {});
+  if (result == EResult::AllocationFailure)
+    return FailureText(request.id, result, "Too many subscriptions on this connection.", {});
+  if (result.Failed())
+    return FailureText(request.id, result, {}, {});
+
+  std::string json;
+  AppendHead(json, request.id);
+  json += ",\"result\":";
+  AppendCodeAndName(json, result);
+  json += ",\"outputs\":{},\"epoch\":";
+  AppendString(json, m_epoch);
+  json += ",\"sequence\":";
+  AppendNumber(json, m_notifier.Sequence());
+  json += "}}";
+  return json;
+}
+
+}

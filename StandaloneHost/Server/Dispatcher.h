@@ -1,0 +1,52 @@
+#pragma once
+
+#include "StandaloneHost/Server/Envelope.h"
+#include "StandaloneHost/Server/Notifier.h"
+#include "StandaloneHost/Server/Registry.h"
+
+#include <functional>
+#include <memory>
+#include <string>
+#include <string_view>
+
+namespace Server
+{
+
+/// Receives the answer to one message, an empty text when there is none to give, and how many calls it was for.
+using Answer = std::function<void(std::string text, std::size_t calls)>;
+
+/// Carries out the messages of clients: finds the function of each call, puts its arguments in order, and words the
+/// answers. [server]
+class Dispatcher
+{
+public:
+  Dispatcher(const Registry& registry, Notifier& notifier, const Limits& limits, TerminalServer2::Level grantedLevel,
+             std::string epoch);
+
+  /// Carries out one message. `answer` is called exactly once, perhaps before this returns. `listener` is the client
+  /// as one that can be told of changes; null when its transport cannot. Returns how many calls were begun.
+  std::size_t Handle(std::string_view text, IListener* listener, Answer answer);
+
+  /// The greeting for a new client.
+  [[nodiscard]] std::string Hello(std::uint64_t session) const;
+
+  /// The description of everything that is offered, an OpenRPC document.
+  [[nodiscard]] const std::string& Description() const;
+
+private:
+  using Reply = std::function<void(std::string text)>;
+
+  void HandleRequest(const Request& request, IListener* listener, Reply reply);
+  void Call(const FunctionEntry& entry, const Request& request, Reply reply);
+  [[nodiscard]] std::string CallServer(const Request& request, IListener* listener);
+  [[nodiscard]] std::string Subscription(const Request& request, IListener* listener);
+
+  const Registry& m_registry;
+  Notifier& m_notifier;
+  const Limits& m_limits;
+  const TerminalServer2::Level m_grantedLevel;
+  const std::string m_epoch;
+  mutable std::string m_description; // made when first asked for
+};
+
+}

@@ -1,0 +1,21 @@
+#pragma once
+
+#include <cstddef>
+
+namespace Server
+{
+
+/// What one client may ask of the server. All of it is told in the greeting.
+struct Limits
+{
+  std::size_t messageBytes = std::size_t{1} << 20;
+  std::size_t nesting = 32; ///< of arrays and objects in a message
+  std::size_t batchCalls = 256;
+  std::size_t connections = 1100;
+  std::size_t subscriptions = 64;               ///< of one connection
+  std::size_t callsInFlight = 1024;             ///< of one connection; more wait in the socket
+  std::size_t outgoingBytes = std::size_t{8} << 20; ///< waiting for one connection to read them
+  std::size_t outgoingNotifications = 256;      ///< likewise, of those that may not be merged
+};
+
+}

@@ -1,0 +1,237 @@
+#include "StandaloneHost/Server/VServer.h"
+
+#include "HostInterface/DebugServices/CallAssertFailHandler.h"
+#include "HostInterface/NMX/GlobalLog.h"
+#include "StandaloneHost/Server/Core.h"
+#include "StandaloneHost/Server/HttpSession.h"
+
+#include <boost/asio/io_context.hpp>
+#include <boost/asio/ip/tcp.hpp>
+#include <boost/asio/post.hpp>
+#include <boost/asio/steady_timer.hpp>
+
+#include <future>
+#include <random>
+#include <utility>
+
+namespace Server
+{
+
+namespace asio = boost::asio;
+using Tcp = asio::ip::tcp;
+using Socket = asio::basic_stream_socket<Tcp, asio::io_context::executor_type>;
+using Acceptor = asio::basic_socket_acceptor<Tcp, asio::io_context::executor_type>;
+using Clock = std::chrono::steady_clock;
+using boost::system::error_code;
+using NMX::EResult;
+using NMX::IResult;
+
+namespace
+{
+
+constexpr auto tick = std::chrono::milliseconds(500);
+constexpr auto closingTick = std::chrono::milliseconds(10);
+constexpr auto closingTime = std::chrono::milliseconds(1500);
+constexpr auto acceptPause = std::chrono::milliseconds(100);
+
+/// A text that no other start of a host has.
+std::string NewEpoch()
+{
+  static constexpr std::string_view digits = "0123456789abcdef";
+  std::random_device random;
+  std::string epoch;
+  for (int i = 0; i < 4; ++i)
+    for (unsigned word = random(), digit = 0; digit < 8; ++digit, word >>= 4)
+      epoch += digits[word & 0xF];
+  return epoch;
+}
+
+}
+
+/// What runs on the server's thread. Handlers hold it weakly: whatever owns the context must not be held by it.
+struct VServer::State : std::enable_shared_from_this<State>
+{
+  State(std::shared_ptr<NMX::IAsioPostalService> service, ServerOptions options)
+      : postal(std::move(service)), core(std::make_shared<Core>(std::move(options), NewEpoch())),
+        acceptor(postal->Context().get_executor()), timer(postal->Context())
+  {
+  }
+
+  void Accept()
+  {
+    acceptor.async_accept(
+        [weak = weak_from_this()](error_code error, Socket socket)
+        {
+          if (const auto self = weak.lock(); self && self->acceptor.is_open())
+            self->OnAccepted(error, std::move(socket));
+        });
+  }
+
+  void OnAccepted(error_code error, Socket socket)
+  {
+    if (error)
+    {
+      // Most likely there are too many open files: try again when some may have been closed.
+      NMX::Log(NMX::serverLog, NMX::ESeverity::Warning, "A connection could not be accepted: %1%", error.message());
+      acceptTimer.expires_after(acceptPause);
+      acceptTimer.async_wait(
+          [weak = weak_from_this()](error_code cancelled)
+          {
+            if (const auto self = weak.lock(); self && !cancelled && self->acceptor.is_open())
+              self->Accept();
+          });
+      return;
+    }
+    error_code ignored;
+    socket.set_option(Tcp::no_delay(true), ignored);
+    if (core->connections.Count() >= core->options.limits.connections)
+      RefuseHttp(std::move(socket), core);
+    else
+      StartHttp(std::move(socket), core);
+    Accept();
+  }
+
+  /// Ends the connections that wait for too long: one coarse timer for all.
+  void Tick()
+  {
+    timer.expires_after(tick);
+    timer.async_wait(
+        [weak = weak_from_this()](error_code cancelled)
+        {
+          const auto self = weak.lock();
+          if (!self || cancelled || self->core->closing)
+            return;
+          self->core->connections.ForEach(
+              [now = Clock::now()](IConnection& connection)
+              {
+                if (connection.Overdue(now))
+                  connection.Abort();
+              });
+          self->Tick();
+        });
+  }
+
+  void BeginClose(std::shared_ptr<std::promise<void>> done)
+  {
+    core->closing = true;
+    error_code ignored;
+    acceptor.close(ignored);
+    acceptTimer.cancel();
+    timer.cancel();
+    FinishCalls();
+    core->connections.ForEach([](IConnection& connection) { connection.Close(); });
+    AwaitClosed(Clock::now() + closingTime, std::move(done));
+  }
+
+  void FinishCalls()
+  {
+    for (const FunctionEntry& entry : core->registry.Functions())
+      entry.function->FinishOutstanding(EResult::ShuttingDown);
+  }
+
+  void AwaitClosed(Clock::time_point deadline, std::shared_ptr<std::promise<void>> done)
+  {
+    if (core->connections.Count() == 0 || Clock::now() > deadline)
+    {
+      core->connections.ForEach([](IConnection& connection) { connection.Abort(); });
+      FinishCalls(); // those that came in with the last requests
+      core->notifier.Close();
+      core->registry.Clear();
+      done->set_value();
+      return;
+    }
+    timer.expires_after(closingTick);
+    timer.async_wait([self = shared_from_this(), deadline, done = std::move(done)](error_code) mutable
+                     { self->AwaitClosed(deadline, std::move(done)); });
+  }
+
+  const std::shared_ptr<NMX::IAsioPostalService> postal;
+  const std::shared_ptr<Core> core;
+  Acceptor acceptor;
+  asio::steady_timer timer;
+  asio::steady_timer acceptTimer{postal->Context()};
+  std::string address;
+  unsigned short port = 0;
+  bool open = false; // on the host's thread
+};
+
+VServer::VServer(std::shared_ptr<NMX::IAsioPostalService> postal, ServerOptions options)
+    : m_state(std::make_shared<State>(std::move(postal), std::move(options)))
+{
+}
+
+VServer::~VServer()
+{
+  if (m_state->open)
+    DebugServices::CallAssertFailHandler("the server was closed", __FILE__, __LINE__);
+}
+
+IResult VServer::RegisterType(TerminalServer2::Level level, const TerminalServer2::TypeRecord& record)
+{
+  return m_state->open ? EResult::NotAvailable : m_state->core->registry.Add(level, record);
+}
+
+IResult VServer::RegisterCallback(TerminalServer2::Level level, std::shared_ptr<NMX::IServerCallback> callback)
+{
+  return m_state->open ? EResult::NotAvailable : m_state->core->registry.Add(level, std::move(callback));
+}
+
+IResult VServer::RegisterFunction(TerminalServer2::Level level, std::shared_ptr<NMX::IServerFunction> function)
+{
+  return m_state->open ? EResult::NotAvailable : m_state->core->registry.Add(level, std::move(function));
+}
+
+void VServer::Open()
+{
+  const ServerOptions& options = m_state->core->options;
+  const std::string where = options.address + ':' + std::to_string(options.port);
+  try
+  {
+    const Tcp::endpoint endpoint(asio::ip::make_address(options.address), options.port);
+    m_state->acceptor.open(endpoint.protocol());
+    m_state->acceptor.set_option(Acceptor::reuse_address(true));
+    m_state->acceptor.bind(endpoint);
+    m_state->acceptor.listen();
+    m_state->port = m_state->acceptor.local_endpoint().port();
+  }
+  catch (const boost::system::system_error& failure)
+  {
+    throw ServerError("cannot serve " + where + ": " + failure.code().message());
+  }
+  const bool isV6 = options.address.find(':') != std::string::npos;
+  m_state->address =
+      (isV6 ? '[' + options.address + ']' : options.address) + ':' + std::to_string(m_state->port);
+  m_state->open = true;
+  asio::post(m_state->postal->Context(),
+             [state = m_state]
+             {
+               state->Accept();
+               state->Tick();
+             });
+}
+
+void VServer::Close()
+{
+  if (!m_state->open)
+  {
+    m_state->core->registry.Clear();
+    return;
+  }
+  const auto done = std::make_shared<std::promise<void>>();
+  auto closed = done->get_future();
+  asio::post(m_state->postal->Context(), [state = m_state, done] { state->BeginClose(done); });
+  closed.wait();
+  m_state->open = false;
+}
+
+const std::string& VServer::Address() const
+{
+  return m_state->address;
+}
+
+unsigned short VServer::Port() const
+{
+  return m_state->port;
+}
+
+}

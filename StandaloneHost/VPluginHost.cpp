@@ -1,0 +1,134 @@
+#include "StandaloneHost/VPluginHost.h"
+
+#include <utility>
+
+using namespace RunaCorePluginInterface;
+
+namespace
+{
+
+class VFeatures final : public IFeatures
+{
+public:
+  explicit VFeatures(std::uint32_t mask) : m_mask(mask) {}
+  [[nodiscard]] std::uint32_t Mask() const override { return m_mask; }
+
+private:
+  const std::uint32_t m_mask;
+};
+
+}
+
+VPluginHost::VPluginHost(HostServices services) : m_services(std::move(services)) {}
+
+void VPluginHost::Store(std::shared_ptr<NMX::IStore>& store) const
+{
+  store = m_services.store;
+}
+
+void VPluginHost::PanelServices(std::shared_ptr<IPanelServices>& services) const
+{
+  services.reset();
+}
+
+void VPluginHost::PostalService(std::shared_ptr<NMX::IPostalService>& postal) const
+{
+  postal.reset();
+}
+
+void VPluginHost::NotificationPostalService(std::shared_ptr<NMX::IAsioPostalService>& postal) const
+{
+  postal = m_services.notificationPostal;
+}
+
+void VPluginHost::FileIO(std::shared_ptr<IRunaCoreFileIO>& fileIO) const
+{
+  fileIO.reset();
+}
+
+void VPluginHost::SelectionManager(std::shared_ptr<ISelectionManager>& selectionManager) const
+{
+  selectionManager.reset();
+}
+
+void VPluginHost::FlowStateCacheContextProvider(std::shared_ptr<IFlowStateCacheContextProvider>& provider) const
+{
+  provider.reset();
+}
+
+void VPluginHost::Server(std::shared_ptr<TerminalServer2::IServer>& server) const
+{
+  server = m_services.server;
+}
+
+void VPluginHost::ObjectPresetProvider(std::shared_ptr<IObjectPresetProvider>& provider) const
+{
+  provider.reset();
+}
+
+void VPluginHost::SubjectOriginTools(std::shared_ptr<ISubjectOriginTools>& tools) const
+{
+  tools.reset();
+}
+
+void VPluginHost::Settings(std::shared_ptr<IPluginSettings>& settings) const
+{
+  settings = m_services.settings;
+}
+
+void VPluginHost::DeviceLayoutRegistry(std::shared_ptr<IDeviceLayoutRegistry>& registry) const
+{
+  registry.reset();
+}
+
+void VPluginHost::UndoManager(std::shared_ptr<IRunaCoreUndoManager>& undoManager) const
+{
+  undoManager.reset();
+}
+
+void VPluginHost::CalibrationProvider(std::shared_ptr<ICalibrationProvider>& provider) const
+{
+  provider.reset();
+}
+
+void VPluginHost::OfflineStoreServices(std::shared_ptr<IOfflineStoreServices>& services) const
+{
+  services.reset();
+}
+
+void VPluginHost::AccessRights(std::shared_ptr<IAccessRights>& rights) const
+{
+  rights.reset();
+}
+
+VPluginSettings::VPluginSettings(std::uint32_t featureMask) : m_features(std::make_shared<VFeatures>(featureMask)) {}
+
+void VPluginSettings::Features(std::shared_ptr<IFeatures>& features) const
+{
+  features = m_features;
+}
+
+void VPluginSettings::SmartObjectControls(std::shared_ptr<ISmartObjectControls>& controls) const
+{
+  controls.reset();
+}
+
+void VPluginSettings::RigidObjectControls(std::shared_ptr<IRigidObjectControls>& controls) const
+{
+  controls.reset();
+}
+
+void VPluginSettings::ObjectEvaluationSettings(std::shared_ptr<IObjectEvaluationSettings>& settings) const
+{
+  settings.reset();
+}
+
+void VPluginSettings::CharacterSettings(std::shared_ptr<ICharacterSettings>& settings) const
+{
+  settings.reset();
+}
+
+void VPluginSettings::CalibrationSettings(std::shared_ptr<ICalibrationSettings>& settings) const
+{
+  settings.reset();
+}

@@ -1,0 +1,74 @@
+// What the API publishes about itself, and what follows from it for an answer.
+
+import assert from 'node:assert/strict';
+import { readFileSync } from 'node:fs';
+
+export const published = JSON.parse(readFileSync(new URL('../Catalogue/published-api.json', import.meta.url), 'utf8'));
+
+const records = published.groups.flatMap(group => group.functions);
+
+export const callbacks = records.filter(record => record.name.endsWith('Callback'));
+export const functions = records.filter(record => !record.name.endsWith('Callback'));
+
+export const codes = {
+  Ok: 0,
+  OkButNoEffect: 1,
+  NotSupported: 0x80000005,
+  NotPermitted: 0x80000006,
+  NotSet: 0x80000009,
+  NotFound: 0x8000000a,
+  AlreadyPresent: 0x8000000c,
+  InvalidArgument: 0x8000000f,
+  InvalidName: 0x80000011,
+  InvalidFormat: 0x80000016,
+  InvalidValue: 0x8000001b,
+  ShuttingDown: 0x80000027,
+};
+
+export const changed = 'BasicObjectServices.BasicObjectChangedCallback';
+
+export function inputs(record) {
+  return record.arguments.filter(argument => argument.direction === 'input');
+}
+
+export function outputs(record) {
+  return record.arguments.filter(argument => argument.direction === 'output');
+}
+
+// The failures that a function documents: [name, text].
+export function documentedFailures(record) {
+  return record.results.split('\n').filter(line => line !== '' && !line.startsWith('Ok - '))
+    .map(line => line.split(/ - (.*)/, 2));
+}
+
+// The error member of a failed call.
+export function failure(method, name) {
+  const record = functions.find(known => known.name === method);
+  const text = documentedFailures(record).find(([code]) => code === name)?.[1] ?? '';
+  return { code: codes[name] | 0, message: name, data: { code: codes[name], text } };
+}
+
+export function success(values = {}) {
+  return { code: 0, name: 'Ok', outputs: values };
+}
+
+// Checks a whole answer, its envelope included.
+export function assertSucceeds(answer, values = {}) {
+  assert.deepEqual(answer, { jsonrpc: '2.0', id: answer.id, result: success(values) });
+}
+
+export function assertFails(answer, method, name) {
+  assert.deepEqual(answer, { jsonrpc: '2.0', id: answer.id, error: failure(method, name) });
+}
+
+// Everything that the API tells about the basic objects: for each, the answers to all queries by name.
+export async function snapshot(connection) {
+  const list = await connection.call('BasicObjectServices.BasicObjectList');
+  const queries = functions.filter(record => inputs(record).length === 1 && outputs(record).length === 1);
+  const objects = {};
+  for (const name of list.result.outputs.Names) {
+    const answers = await Promise.all(queries.map(query => connection.call(query.name, [name])));
+    objects[name] = answers.map(({ result, error }) => result ?? error);
+  }
+  return objects;
+}

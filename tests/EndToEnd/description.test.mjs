@@ -1,0 +1,116 @@
+// The description that the server gives of itself.
+
+import assert from 'node:assert/strict';
+import { after, before, describe, test } from 'node:test';
+
+import { validateOpenRPCDocument } from '@open-rpc/schema-utils-js';
+
+import { callbacks, documentedFailures, codes, functions, inputs, outputs, published } from './api.mjs';
+import { startHost } from './host.mjs';
+import { post, request } from './wire.mjs';
+
+const own = ['Server.Subscribe', 'Server.Unsubscribe', 'rpc.discover'];
+const groupOf = name => name.split('.')[0];
+
+const enumerationItem = name => {
+  const { values } = published.enumerations.find(enumeration => enumeration.name.endsWith(`.${name}`));
+  return { type: 'integer', enum: values.map(value => value.number) };
+};
+
+// What matters of the schema of each published type.
+const schemas = {
+  'text': schema => ({ type: schema.type }),
+  'bool': schema => ({ type: schema.type }),
+  'set of texts': schema => ({ type: schema.type, items: schema.items?.type, unique: schema.uniqueItems }),
+};
+const expectedSchemas = {
+  'text': { type: 'string' },
+  'bool': { type: 'boolean' },
+  'set of texts': { type: 'array', items: 'string', unique: true },
+};
+
+function assertSchema(schema, type) {
+  const [, enumeration] = /^map (\w+) to text$/.exec(type) ?? [];
+  if (enumeration === undefined) {
+    assert.deepEqual(schemas[type](schema), expectedSchemas[type]);
+    return;
+  }
+  const [number, text] = schema.items.items;
+  assert.deepEqual([schema.type, schema.items.type, schema.items.minItems, schema.items.maxItems, text.type],
+                   ['array', 'array', 2, 2, 'string']);
+  assert.deepEqual({ type: number.type, enum: number.enum }, enumerationItem(enumeration));
+}
+
+// A schema and all that stand within it.
+function* within(schema) {
+  yield schema;
+  for (const inner of [...Object.values(schema.properties ?? {}), ...[schema.items ?? []].flat()])
+    yield* within(inner);
+}
+
+describe('The description', () => {
+  let host;
+  let document;
+
+  before(async () => {
+    host = await startHost();
+    document = (await post(host, 'rpc.discover', [])).result;
+  });
+
+  after(() => host.assertEndsWell());
+
+  test('is the same as a page', async () => {
+    const page = await request(host, { method: 'GET', path: '/openrpc.json' });
+    assert.equal(page.status, 200);
+    assert.deepEqual(JSON.parse(page.body), document);
+  });
+
+  test('is a valid OpenRPC document', () => {
+    assert.equal(validateOpenRPCDocument(document), true);
+    const { methods: [{ params, ...spoiled }] } = document;
+    assert.notEqual(validateOpenRPCDocument({ ...document, methods: [spoiled] }), true, 'the validator sees faults');
+  });
+
+  test('has every function with its texts, in their order', () => {
+    assert.deepEqual(document.methods.slice(0, functions.length).map(method => method.name), functions.map(({ name }) => name));
+    assert.deepEqual(document.methods.slice(functions.length).map(method => method.name).sort(), own);
+    for (const [i, record] of functions.entries()) {
+      const method = document.methods[i];
+      assert.equal(method.description, record.description);
+      assert.equal(method['x-resultDocumentation'], record.results);
+      assert.equal(method['x-group'], groupOf(record.name));
+      assert.equal(method['x-level'], 2);
+
+      assert.deepEqual(method.params.map(({ name, description, required }) => ({ name, description, required })),
+                       inputs(record).map(({ name, text }) => ({ name, description: text, required: true })));
+      inputs(record).forEach(({ type }, k) => assertSchema(method.params[k].schema, type));
+
+      const described = Object.entries(method.result.schema.properties.outputs.properties);
+      assert.deepEqual(described.map(([name, schema]) => [name, schema.description]),
+                       outputs(record).map(({ name, text }) => [name, text]));
+      outputs(record).forEach(({ type }, k) => assertSchema(described[k][1], type));
+
+      assert.deepEqual(method.errors, documentedFailures(record).map(([name, text]) => (
+        { code: codes[name] | 0, message: name, data: { code: codes[name], text } })));
+    }
+  });
+
+  test('has every callback and every type, in their order', () => {
+    assert.deepEqual(document['x-callbacks'].map(callback => ({ name: callback.name, description: callback.description,
+                                                                params: callback.params, level: callback['x-level'] })),
+                     callbacks.map(({ name, description }) => ({ name, description, params: [], level: 2 })));
+    const types = published.groups.flatMap(({ name, description }) => [
+      { name, description, values: [] }, ...published.enumerations.filter(enumeration => groupOf(enumeration.name) === name)]);
+    assert.deepEqual(document['x-types'], types.map(({ name, description, values }) => ({
+      name, description, 'x-level': 2,
+      values: values.map(value => ({ name: value.name, value: value.number, description: value.text })) })));
+  });
+
+  test('gives every schema a title of its own', () => {
+    const contents = [...document.methods, ...document['x-callbacks']].flatMap(({ params, result }) => [...params, result ?? []].flat());
+    const titles = contents.flatMap(({ schema }) => [...within(schema)].map(inner => inner.title));
+    assert.ok(titles.length > functions.length);
+    assert.ok(titles.every(title => typeof title === 'string' && title !== ''));
+    assert.deepEqual(titles.filter((title, i) => titles.indexOf(title) !== i), []);
+  });
+});
