@@ -25,7 +25,8 @@ std::shared_ptr<Store::VStore> OpenStore(const Options& options)
   std::error_code error;
   std::filesystem::create_directories(*options.dataFolder, error);
   if (error)
-    throw Store::ArchiveError("cannot use the data folder \"" + options.dataFolder->string() + "\": " + error.message());
+    throw Store::ArchiveError("cannot use the data folder \"" + options.dataFolder->string() +
+                              "\": " + error.message());
   return NMX::MakeShared<Store::VStore>(std::make_unique<Store::SqliteArchive>(*options.dataFolder / "store.sqlite"));
 }
 
@@ -75,8 +76,8 @@ void WaitForSignal()
 void Stop(Server::VServer& server, Postal::VAsioPostalService& postal, PluginPointer plugin,
           std::shared_ptr<Store::VStore> store)
 {
-  server.Close();          // no client, no outstanding call, no function any more
-  postal.Stop();           // the strands have run empty
+  server.Close(); // no client, no outstanding call, no function any more
+  postal.Stop();  // the strands have run empty
   plugin->UnregisterQml();
   plugin.reset();
   store.reset();

@@ -95,23 +95,22 @@ std::filesystem::path UserDataFolder()
 po::options_description Description()
 {
   po::options_description description("subject-store-host [options]");
-  const auto text = [](std::string fallback)
-  { return po::value<std::string>()->default_value(std::move(fallback)); };
+  const auto text = [](std::string fallback) { return po::value<std::string>()->default_value(std::move(fallback)); };
   const auto texts = [] { return po::value<std::vector<std::string>>()->composing(); };
-  description.add_options()                                                                           //
-      ("help", "show this text and exit")                                                             //
-      ("config", texts(), "subject configuration to load when the store is empty (repeatable)")       //
+  description.add_options()                                                                     //
+      ("help", "show this text and exit")                                                       //
+      ("config", texts(), "subject configuration to load when the store is empty (repeatable)") //
       ("data", po::value<std::string>(),
        "folder in which the store is kept, or :memory: to keep nothing (default: the user's data folder)") //
-      ("listen", text("127.0.0.1:8420"), "ADDRESS:PORT to serve; port 0 takes a free one")            //
+      ("listen", text("127.0.0.1:8420"), "ADDRESS:PORT to serve; port 0 takes a free one")                 //
       ("token-file", po::value<std::string>(),
-       "clients must present the token in this file; required unless the address is loopback")        //
-      ("allow-origin", texts(), "origin of a web page that may connect (repeatable)")                 //
-      ("features", text("0xFFFFFFFF"), "feature mask, decimal or 0x...")                              //
-      ("level", text("2"), "2, or 1 to open the preview functions as well")                           //
-      ("headless", "no window")                                                                       //
-      ("ready-file", po::value<std::string>(), "file to write once calls are served")                 //
-      ("plugin-file", po::value<std::string>(), "plugin module to load (default: the host's own)")    //
+       "clients must present the token in this file; required unless the address is loopback")     //
+      ("allow-origin", texts(), "origin of a web page that may connect (repeatable)")              //
+      ("features", text("0xFFFFFFFF"), "feature mask, decimal or 0x...")                           //
+      ("level", text("2"), "2, or 1 to open the preview functions as well")                        //
+      ("headless", "no window")                                                                    //
+      ("ready-file", po::value<std::string>(), "file to write once calls are served")              //
+      ("plugin-file", po::value<std::string>(), "plugin module to load (default: the host's own)") //
       ("log", text("notice"), "error, warning, notice, info, debug or trace");
   return description;
 }
@@ -162,8 +161,9 @@ Request ReadOptions(int argumentCount, const char* const* arguments)
   if (values.count("token-file") != 0)
     options.server.token = ReadToken(given("token-file"));
   if (options.server.token.empty() && !boost::asio::ip::make_address(options.server.address).is_loopback())
-    throw OptionError("--listen: " + options.server.address + " can be reached from other machines, so a token is "
-                                                              "required: --token-file FILE");
+    throw OptionError("--listen: " + options.server.address +
+                      " can be reached from other machines, so a token is "
+                      "required: --token-file FILE");
   options.server.allowedOrigins = list("allow-origin");
   options.features = ParseNumber<std::uint32_t>(given("features"), "features");
   options.server.grantedLevel = ParseNumber<std::uint32_t>(given("level"), "level");

@@ -51,8 +51,8 @@ public:
   void Features(std::shared_ptr<RunaCorePluginInterface::IFeatures>& features) const override;
   void SmartObjectControls(std::shared_ptr<ISmartObjectControls>& controls) const override;
   void RigidObjectControls(std::shared_ptr<IRigidObjectControls>& controls) const override;
-  void
-  ObjectEvaluationSettings(std::shared_ptr<RunaCorePluginInterface::IObjectEvaluationSettings>& settings) const override;
+  void ObjectEvaluationSettings(
+      std::shared_ptr<RunaCorePluginInterface::IObjectEvaluationSettings>& settings) const override;
   void CharacterSettings(std::shared_ptr<RunaCorePluginInterface::ICharacterSettings>& settings) const override;
   void CalibrationSettings(std::shared_ptr<RunaCorePluginInterface::ICalibrationSettings>& settings) const override;
 

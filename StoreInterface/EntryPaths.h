@@ -25,44 +25,155 @@ template <PathText path>
   return constant;
 }
 
-[[nodiscard]] inline EntryPath SubjectId() { return PathConstant<"SubjectId">(); }
-[[nodiscard]] inline EntryPath Parameters() { return PathConstant<"Parameters">(); }
-[[nodiscard]] inline EntryPath Name() { return PathConstant<"Parameters/Name">(); }
-[[nodiscard]] inline EntryPath Enabled() { return PathConstant<"Parameters/Enabled">(); }
-[[nodiscard]] inline EntryPath Flags() { return PathConstant<"Parameters/Flags">(); }
-[[nodiscard]] inline EntryPath AutoAssignedName() { return PathConstant<"Parameters/AutoAssignedName">(); }
-[[nodiscard]] inline EntryPath AutoAssignEnabled() { return PathConstant<"Parameters/AutoAssignEnabled">(); }
-[[nodiscard]] inline EntryPath Calibration() { return PathConstant<"Parameters/Calibration">(); }
-[[nodiscard]] inline EntryPath ColourRGBA() { return PathConstant<"Parameters/ColourRGBA">(); }
-[[nodiscard]] inline EntryPath FilePath() { return PathConstant<"Parameters/FilePath">(); }
-[[nodiscard]] inline EntryPath LinkedCameraURN() { return PathConstant<"Parameters/LinkedCameraURN">(); }
-[[nodiscard]] inline EntryPath PresetName() { return PathConstant<"Parameters/PresetName">(); }
-[[nodiscard]] inline EntryPath ProximityGroupName() { return PathConstant<"Parameters/ProximityGroupName">(); }
-[[nodiscard]] inline EntryPath Retarget() { return PathConstant<"Parameters/Retarget">(); }
-[[nodiscard]] inline EntryPath RootSegmentName() { return PathConstant<"Parameters/RootSegmentName">(); }
-[[nodiscard]] inline EntryPath TemplateGroupName() { return PathConstant<"Parameters/TemplateGroupName">(); }
-[[nodiscard]] inline EntryPath TrackWithObjectTracker() { return PathConstant<"Parameters/TrackWithObjectTracker">(); }
-[[nodiscard]] inline EntryPath ParentSubjectId() { return PathConstant<"ParentSubjectId">(); }
-[[nodiscard]] inline EntryPath ParentSubjectSlotId() { return PathConstant<"ParentSubjectSlotId">(); }
-[[nodiscard]] inline EntryPath Children() { return PathConstant<"Children">(); }
-[[nodiscard]] inline EntryPath Roles() { return PathConstant<"Roles">(); }
-[[nodiscard]] inline EntryPath RoleLabelling() { return PathConstant<"Roles/Labelling">(); }
-[[nodiscard]] inline EntryPath RoleRetargeting() { return PathConstant<"Roles/Retargeting">(); }
-[[nodiscard]] inline EntryPath RoleSolving() { return PathConstant<"Roles/Solving">(); }
-[[nodiscard]] inline EntryPath ReloadRetargetAction() { return PathConstant<"ReloadRetargetAction">(); }
-[[nodiscard]] inline EntryPath SmartObject() { return PathConstant<"SmartObject">(); }
-[[nodiscard]] inline EntryPath AdditionalMarkerPositions() { return PathConstant<"SmartObject/AdditionalMarkerPositions">(); }
-[[nodiscard]] inline EntryPath MarkersOnWhileCharging() { return PathConstant<"SmartObject/MarkersOnWhileCharging">(); }
-[[nodiscard]] inline EntryPath SkinName() { return PathConstant<"SmartObject/SkinName">(); }
-[[nodiscard]] inline EntryPath SmartClusters() { return PathConstant<"SmartObject/SmartClusters">(); }
-[[nodiscard]] inline EntryPath ModelOutputs() { return PathConstant<"ModelOutputs">(); }
-[[nodiscard]] inline EntryPath ModelOutputCGM2() { return PathConstant<"ModelOutputs/CGM2">(); }
-[[nodiscard]] inline EntryPath ModelOutputPluginKinex() { return PathConstant<"ModelOutputs/PluginKinex">(); }
-[[nodiscard]] inline EntryPath Warnings() { return PathConstant<"Warnings">(); }
-[[nodiscard]] inline EntryPath WarningCFCChildWarning() { return PathConstant<"Warnings/WarningCFCChildWarning">(); }
+[[nodiscard]] inline EntryPath SubjectId()
+{
+  return PathConstant<"SubjectId">();
+}
+[[nodiscard]] inline EntryPath Parameters()
+{
+  return PathConstant<"Parameters">();
+}
+[[nodiscard]] inline EntryPath Name()
+{
+  return PathConstant<"Parameters/Name">();
+}
+[[nodiscard]] inline EntryPath Enabled()
+{
+  return PathConstant<"Parameters/Enabled">();
+}
+[[nodiscard]] inline EntryPath Flags()
+{
+  return PathConstant<"Parameters/Flags">();
+}
+[[nodiscard]] inline EntryPath AutoAssignedName()
+{
+  return PathConstant<"Parameters/AutoAssignedName">();
+}
+[[nodiscard]] inline EntryPath AutoAssignEnabled()
+{
+  return PathConstant<"Parameters/AutoAssignEnabled">();
+}
+[[nodiscard]] inline EntryPath Calibration()
+{
+  return PathConstant<"Parameters/Calibration">();
+}
+[[nodiscard]] inline EntryPath ColourRGBA()
+{
+  return PathConstant<"Parameters/ColourRGBA">();
+}
+[[nodiscard]] inline EntryPath FilePath()
+{
+  return PathConstant<"Parameters/FilePath">();
+}
+[[nodiscard]] inline EntryPath LinkedCameraURN()
+{
+  return PathConstant<"Parameters/LinkedCameraURN">();
+}
+[[nodiscard]] inline EntryPath PresetName()
+{
+  return PathConstant<"Parameters/PresetName">();
+}
+[[nodiscard]] inline EntryPath ProximityGroupName()
+{
+  return PathConstant<"Parameters/ProximityGroupName">();
+}
+[[nodiscard]] inline EntryPath Retarget()
+{
+  return PathConstant<"Parameters/Retarget">();
+}
+[[nodiscard]] inline EntryPath RootSegmentName()
+{
+  return PathConstant<"Parameters/RootSegmentName">();
+}
+[[nodiscard]] inline EntryPath TemplateGroupName()
+{
+  return PathConstant<"Parameters/TemplateGroupName">();
+}
+[[nodiscard]] inline EntryPath TrackWithObjectTracker()
+{
+  return PathConstant<"Parameters/TrackWithObjectTracker">();
+}
+[[nodiscard]] inline EntryPath ParentSubjectId()
+{
+  return PathConstant<"ParentSubjectId">();
+}
+[[nodiscard]] inline EntryPath ParentSubjectSlotId()
+{
+  return PathConstant<"ParentSubjectSlotId">();
+}
+[[nodiscard]] inline EntryPath Children()
+{
+  return PathConstant<"Children">();
+}
+[[nodiscard]] inline EntryPath Roles()
+{
+  return PathConstant<"Roles">();
+}
+[[nodiscard]] inline EntryPath RoleLabelling()
+{
+  return PathConstant<"Roles/Labelling">();
+}
+[[nodiscard]] inline EntryPath RoleRetargeting()
+{
+  return PathConstant<"Roles/Retargeting">();
+}
+[[nodiscard]] inline EntryPath RoleSolving()
+{
+  return PathConstant<"Roles/Solving">();
+}
+[[nodiscard]] inline EntryPath ReloadRetargetAction()
+{
+  return PathConstant<"ReloadRetargetAction">();
+}
+[[nodiscard]] inline EntryPath SmartObject()
+{
+  return PathConstant<"SmartObject">();
+}
+[[nodiscard]] inline EntryPath AdditionalMarkerPositions()
+{
+  return PathConstant<"SmartObject/AdditionalMarkerPositions">();
+}
+[[nodiscard]] inline EntryPath MarkersOnWhileCharging()
+{
+  return PathConstant<"SmartObject/MarkersOnWhileCharging">();
+}
+[[nodiscard]] inline EntryPath SkinName()
+{
+  return PathConstant<"SmartObject/SkinName">();
+}
+[[nodiscard]] inline EntryPath SmartClusters()
+{
+  return PathConstant<"SmartObject/SmartClusters">();
+}
+[[nodiscard]] inline EntryPath ModelOutputs()
+{
+  return PathConstant<"ModelOutputs">();
+}
+[[nodiscard]] inline EntryPath ModelOutputCGM2()
+{
+  return PathConstant<"ModelOutputs/CGM2">();
+}
+[[nodiscard]] inline EntryPath ModelOutputPluginKinex()
+{
+  return PathConstant<"ModelOutputs/PluginKinex">();
+}
+[[nodiscard]] inline EntryPath Warnings()
+{
+  return PathConstant<"Warnings">();
+}
+[[nodiscard]] inline EntryPath WarningCFCChildWarning()
+{
+  return PathConstant<"Warnings/WarningCFCChildWarning">();
+}
 /// The markers of a basic object, in mm in the object's own frame.
-[[nodiscard]] inline EntryPath Markers() { return PathConstant<"Markers">(); }
+[[nodiscard]] inline EntryPath Markers()
+{
+  return PathConstant<"Markers">();
+}
 /// The slots of a character, in its own order.
-[[nodiscard]] inline EntryPath Slots() { return PathConstant<"Slots">(); }
+[[nodiscard]] inline EntryPath Slots()
+{
+  return PathConstant<"Slots">();
+}
 
 }

@@ -9,8 +9,7 @@ std::optional<std::wstring> ToWide(std::string_view utf8)
 {
   try
   {
-    return boost::locale::conv::utf_to_utf<wchar_t>(utf8.data(), utf8.data() + utf8.size(),
-                                                    boost::locale::conv::stop);
+    return boost::locale::conv::utf_to_utf<wchar_t>(utf8.data(), utf8.data() + utf8.size(), boost::locale::conv::stop);
   }
   catch (const boost::locale::conv::conversion_error&)
   {

@@ -114,8 +114,7 @@ IResult VBasicObjectServices::TemplateGroupName(const std::string& name, std::st
 
 IResult VBasicObjectServices::SetTemplateGroupName(const std::string& name, const std::string& groupName)
 {
-  return Subjects::WriteEntry(*m_store, name, IsBasicObject, Paths::TemplateGroupName(), groupName,
-                              NMX::ENotify::Yes);
+  return Subjects::WriteEntry(*m_store, name, IsBasicObject, Paths::TemplateGroupName(), groupName, NMX::ENotify::Yes);
 }
 
 IResult VBasicObjectServices::AutoAssignEnabled(const std::string& name, bool& enabled) const
@@ -137,8 +136,7 @@ IResult VBasicObjectServices::BasicObjectWarnings(const std::string& name,
                                                   std::map<EBasicObjectWarning, std::string>& warnings) const
 {
   static const Subjects::WarningEntries entries(NMX::basicObjectWarnings);
-  return Subjects::ReadSubject(*m_store, name, IsBasicObject,
-                               [&](const NMX::IStoreReader& reader, TSubjectStoreId id)
+  return Subjects::ReadSubject(*m_store, name, IsBasicObject, [&](const NMX::IStoreReader& reader, TSubjectStoreId id)
                                { return entries.ReadActive(reader, id, warnings); });
 }
 

@@ -1,7 +1,7 @@
 #include "RunaCorePluginSubjectStore/TerminalServer2/ArgumentReader.h"
 
-#include <boost/json/static_resource.hpp>
 #include <boost/json/monotonic_resource.hpp>
+#include <boost/json/static_resource.hpp>
 #include <boost/json/stream_parser.hpp>
 
 #include <cmath>
@@ -40,8 +40,8 @@ bool WholeNumber(const boost::json::value& json, std::uint64_t& number)
     number = static_cast<std::uint64_t>(*signedNumber);
     return true;
   }
-  if (const auto* real = json.if_double(); real != nullptr && *real >= 0 && *real <= exactDouble &&
-                                           std::trunc(*real) == *real)
+  if (const auto* real = json.if_double();
+      real != nullptr && *real >= 0 && *real <= exactDouble && std::trunc(*real) == *real)
   {
     number = static_cast<std::uint64_t>(*real);
     return true;

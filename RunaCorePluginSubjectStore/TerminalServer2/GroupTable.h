@@ -85,8 +85,8 @@ struct Binder<member, Interface, Result(Arguments...)>
                                                     const std::shared_ptr<NMX::IPostalService>& strand)
   {
     return NMX::MakeShared<VServerFunction<Result(Arguments...)>>(
-        record, [service](Arguments... arguments) { return ((*service).*member)(std::forward<Arguments>(arguments)...); },
-        strand);
+        record, [service](Arguments... arguments)
+        { return ((*service).*member)(std::forward<Arguments>(arguments)...); }, strand);
   }
 };
 

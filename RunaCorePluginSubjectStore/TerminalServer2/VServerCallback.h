@@ -34,8 +34,7 @@ public:
 
   [[nodiscard]] NMX::Subscription Subscribe(Listener listener) override
   {
-    return m_multiCallback->Subscribe(m_strand,
-                                      [listener = std::move(listener)](Args... arguments)
+    return m_multiCallback->Subscribe(m_strand, [listener = std::move(listener)](Args... arguments)
                                       { listener(Notification(std::move(arguments)...)); });
   }
 

@@ -50,10 +50,7 @@ private:
 
     [[nodiscard]] std::optional<bool> Returned() const override { return returned; }
 
-    void WriteOutputs(IValueWriter& writer) const override
-    {
-      Write(writer, std::index_sequence_for<Args...>{});
-    }
+    void WriteOutputs(IValueWriter& writer) const override { Write(writer, std::index_sequence_for<Args...>{}); }
 
     void Run() override
     {

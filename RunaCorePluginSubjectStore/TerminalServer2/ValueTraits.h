@@ -23,9 +23,7 @@ struct ValueTraits;
 /// An enumeration of the API: its documentation is found beside it as `DocumentedType(E)`.
 template <class E>
 concept DocumentedEnumeration = std::is_enum_v<E> && requires(E value) {
-  {
-    DocumentedType(value)
-  } -> std::convertible_to<const TypeRecord&>;
+  { DocumentedType(value) } -> std::convertible_to<const TypeRecord&>;
 };
 
 template <>

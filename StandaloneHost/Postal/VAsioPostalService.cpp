@@ -18,8 +18,7 @@ namespace Postal
 struct VAsioPostalService::State
 {
   boost::asio::io_context context{1}; // one thread runs it
-  std::optional<boost::asio::executor_work_guard<boost::asio::io_context::executor_type>> open{
-      context.get_executor()};
+  std::optional<boost::asio::executor_work_guard<boost::asio::io_context::executor_type>> open{context.get_executor()};
   std::thread thread;
 
   void Run()

@@ -18,9 +18,9 @@ struct Visitor
 enum class EAdmission
 {
   Welcome,
-  NoToken,      ///< a token is required and was not presented
-  WrongOrigin,  ///< a web page from elsewhere
-  WrongHost     ///< a name that is not this machine's: a web page whose name was made to point here
+  NoToken,     ///< a token is required and was not presented
+  WrongOrigin, ///< a web page from elsewhere
+  WrongHost    ///< a name that is not this machine's: a web page whose name was made to point here
 };
 
 /// Decides whether a request is let in. Nothing of the request has been carried out yet. [any]

@@ -108,8 +108,7 @@ private:
       const std::size_t size = error ? 0 : Append(buffers);
       if (gathered.size() >= sendAt)
         Flush(shared_from_this());
-      boost::asio::post(socket.get_executor(),
-                        boost::beast::bind_front_handler(std::move(completion), error, size));
+      boost::asio::post(socket.get_executor(), boost::beast::bind_front_handler(std::move(completion), error, size));
     }
 
     template <class Buffers>

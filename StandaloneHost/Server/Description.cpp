@@ -103,14 +103,13 @@ json::object ResultSchema(const std::string& method, json::object outputs, bool 
   json::array names;
   for (const auto& output : outputs)
     names.emplace_back(output.key());
-  json::object properties{
-      {"code", {{"title", method + ".Result.Code"}, {"type", "integer"}, {"minimum", 0}}},
-      {"name", {{"title", method + ".Result.Name"}, {"type", "string"}}},
-      {"outputs",
-       {{"title", method + ".Outputs"},
-        {"type", "object"},
-        {"properties", std::move(outputs)},
-        {"required", std::move(names)}}}};
+  json::object properties{{"code", {{"title", method + ".Result.Code"}, {"type", "integer"}, {"minimum", 0}}},
+                          {"name", {{"title", method + ".Result.Name"}, {"type", "string"}}},
+                          {"outputs",
+                           {{"title", method + ".Outputs"},
+                            {"type", "object"},
+                            {"properties", std::move(outputs)},
+                            {"required", std::move(names)}}}};
   json::array required{"code", "name", "outputs"};
   if (returnsTruth)
   {
@@ -156,8 +155,7 @@ json::object DescribeFunction(const FunctionEntry& entry)
           {"paramStructure", "either"},
           {"params", std::move(params)},
           {"result",
-           {{"name", "Result"},
-            {"schema", ResultSchema(method, std::move(outputs), entry.function->ReturnsTruth())}}},
+           {{"name", "Result"}, {"schema", ResultSchema(method, std::move(outputs), entry.function->ReturnsTruth())}}},
           {"errors", std::move(errors)},
           {"x-group", GroupOf(record.name)},
           {"x-level", entry.level},
@@ -170,9 +168,9 @@ json::object DescribeCallback(const CallbackEntry& entry)
   const auto types = entry.callback->Arguments();
   json::array params;
   for (std::size_t i = 0; i < types.size() && i < record.arguments.size(); ++i)
-    params.push_back(Parameter(record.arguments[i].name, record.arguments[i].text,
-                               Schema(types[i], std::string(record.name) + '.' +
-                                                    std::string(record.arguments[i].name))));
+    params.push_back(
+        Parameter(record.arguments[i].name, record.arguments[i].text,
+                  Schema(types[i], std::string(record.name) + '.' + std::string(record.arguments[i].name))));
   return {{"name", record.name},
           {"description", record.description},
           {"params", std::move(params)},
@@ -193,9 +191,8 @@ json::object DescribeSubscription(std::string_view method, std::string_view desc
   const std::string name(method);
   json::object result = ResultSchema(name, {}, false);
   json::object& properties = result["properties"].as_object();
-  properties["epoch"] = {{"title", name + ".Epoch"},
-                         {"type", "string"},
-                         {"description", "New at each start of the host."}};
+  properties["epoch"] = {
+      {"title", name + ".Epoch"}, {"type", "string"}, {"description", "New at each start of the host."}};
   properties["sequence"] = {{"title", name + ".Sequence"},
                             {"type", "integer"},
                             {"minimum", 0},
@@ -214,14 +211,14 @@ json::object DescribeSubscription(std::string_view method, std::string_view desc
 
 json::object DescribeDiscovery()
 {
-  return {{"name", "rpc.discover"},
-          {"description", "This description."},
-          {"tags", {{{"name", "Server"}}}},
-          {"params", json::array{}},
-          {"result",
-           {{"name", "Description"}, {"schema", {{"title", "rpc.discover.Description"}, {"type", "object"}}}}},
-          {"x-group", "Server"},
-          {"x-level", 2}};
+  return {
+      {"name", "rpc.discover"},
+      {"description", "This description."},
+      {"tags", {{{"name", "Server"}}}},
+      {"params", json::array{}},
+      {"result", {{"name", "Description"}, {"schema", {{"title", "rpc.discover.Description"}, {"type", "object"}}}}},
+      {"x-group", "Server"},
+      {"x-level", 2}};
 }
 
 template <class Entries, class Describe>
@@ -238,10 +235,10 @@ json::array List(const Entries& entries, Describe describe)
 std::string DescribeApi(const Registry& registry)
 {
   json::array methods = List(registry.Functions(), DescribeFunction);
-  methods.push_back(DescribeSubscription(
-      "Server.Subscribe", "Ask to be notified of changes on this connection. Needs a WebSocket."));
-  methods.push_back(DescribeSubscription(
-      "Server.Unsubscribe", "Ask to be notified no longer on this connection. Needs a WebSocket."));
+  methods.push_back(
+      DescribeSubscription("Server.Subscribe", "Ask to be notified of changes on this connection. Needs a WebSocket."));
+  methods.push_back(DescribeSubscription("Server.Unsubscribe",
+                                         "Ask to be notified no longer on this connection. Needs a WebSocket."));
   methods.push_back(DescribeDiscovery());
 
   return json::serialize(json::object{

@@ -234,10 +234,9 @@ void Dispatcher::Call(const FunctionEntry& entry, const Request& request, Reply 
     arguments = ordered;
   }
   // The entry stays until every call has been finished.
-  entry.function->Invoke(arguments,
-                         [id = std::string(request.id), &entry, reply = std::move(reply)](
-                             const NMX::IServerReply& finished)
-                         { reply(id.empty() ? std::string{} : ReplyText(id, entry, finished)); });
+  entry.function->Invoke(
+      arguments, [id = std::string(request.id), &entry, reply = std::move(reply)](const NMX::IServerReply& finished)
+      { reply(id.empty() ? std::string{} : ReplyText(id, entry, finished)); });
 }
 
 std::string Dispatcher::CallServer(const Request& request, IListener* listener)

@@ -111,7 +111,8 @@ private:
     if (error)
       throw NotJson{error.message()};
     m_rest.remove_prefix(read);
-    return *(m_value = new (m_memory.allocate(sizeof(json::value), alignof(json::value))) json::value(parser.release()));
+    return *(m_value =
+                 new (m_memory.allocate(sizeof(json::value), alignof(json::value))) json::value(parser.release()));
   }
 
   std::string_view m_rest;

@@ -31,8 +31,8 @@ struct Complaint
 struct Request
 {
   std::string method;
-  std::string_view params = "[]"; ///< raw JSON, an array or an object
-  std::string_view id;            ///< raw JSON; empty: a notification, which is not answered
+  std::string_view params = "[]";     ///< raw JSON, an array or an object
+  std::string_view id;                ///< raw JSON; empty: a notification, which is not answered
   std::optional<Complaint> complaint; ///< set when it is no request; the id is "null" unless it was readable
 };
 

@@ -12,10 +12,10 @@ struct Limits
   std::size_t nesting = 32; ///< of arrays and objects in a message
   std::size_t batchCalls = 256;
   std::size_t connections = 1100;
-  std::size_t subscriptions = 64;               ///< of one connection
-  std::size_t callsInFlight = 1024;             ///< of one connection; more wait in the socket
+  std::size_t subscriptions = 64;                   ///< of one connection
+  std::size_t callsInFlight = 1024;                 ///< of one connection; more wait in the socket
   std::size_t outgoingBytes = std::size_t{8} << 20; ///< waiting for one connection to read them
-  std::size_t outgoingNotifications = 256;      ///< likewise, of those that may not be merged
+  std::size_t outgoingNotifications = 256;          ///< likewise, of those that may not be merged
 };
 
 }

@@ -199,8 +199,7 @@ void VServer::Open()
     throw ServerError("cannot serve " + where + ": " + failure.code().message());
   }
   const bool isV6 = options.address.find(':') != std::string::npos;
-  m_state->address =
-      (isV6 ? '[' + options.address + ']' : options.address) + ':' + std::to_string(m_state->port);
+  m_state->address = (isV6 ? '[' + options.address + ']' : options.address) + ':' + std::to_string(m_state->port);
   m_state->open = true;
   asio::post(m_state->postal->Context(),
              [state = m_state]

@@ -24,7 +24,9 @@ constexpr auto handshakeTime = std::chrono::seconds(10);
 constexpr auto closingTime = std::chrono::seconds(2);
 
 /// One WebSocket client: reads its messages, queues what is for it, and keeps one write going.
-class WebSocketSession final : public IListener, public IConnection, public std::enable_shared_from_this<WebSocketSession>
+class WebSocketSession final : public IListener,
+                               public IConnection,
+                               public std::enable_shared_from_this<WebSocketSession>
 {
 public:
   WebSocketSession(Socket socket, std::shared_ptr<Core> core)
@@ -116,9 +118,9 @@ private:
     const std::string_view text(static_cast<const char*>(data.data()), data.size());
     try
     {
-      m_callsInFlight += static_cast<std::ptrdiff_t>(m_core->dispatcher.Handle(
-          text, this, [self = shared_from_this()](std::string answer, std::size_t calls)
-          { self->OnAnswer(std::move(answer), calls); }));
+      m_callsInFlight += static_cast<std::ptrdiff_t>(
+          m_core->dispatcher.Handle(text, this, [self = shared_from_this()](std::string answer, std::size_t calls)
+                                    { self->OnAnswer(std::move(answer), calls); }));
     }
     catch (const std::exception& failure)
     {

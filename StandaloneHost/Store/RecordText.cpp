@@ -91,8 +91,8 @@ struct ToJson
   }
   json::value operator()(const std::vector<NMX::Slot>& value) const
   {
-    return ListToJson(value, [](const NMX::Slot& slot) -> json::value
-                      { return json::array{IdToJson(slot.id), slot.name}; });
+    return ListToJson(value,
+                      [](const NMX::Slot& slot) -> json::value { return json::array{IdToJson(slot.id), slot.name}; });
   }
   json::value operator()(const NMX::Option& value) const
   {
@@ -143,26 +143,24 @@ Value FromJson(EValueType type, const json::value& value)
                                          return NMX::Position{at(0), at(1), at(2)};
                                        });
   case EValueType::SmartClusters:
-    return ListFromJson<NMX::SmartCluster>(
-        value,
-        [](const json::value& cluster)
-        {
-          const json::array& parts = cluster.as_array();
-          return NMX::SmartCluster{TextFromJson(parts.at(0)), TextFromJson(parts.at(1)),
-                                   parts.at(2).to_number<std::uint32_t>(), TextFromJson(parts.at(3))};
-        });
+    return ListFromJson<NMX::SmartCluster>(value,
+                                           [](const json::value& cluster)
+                                           {
+                                             const json::array& parts = cluster.as_array();
+                                             return NMX::SmartCluster{
+                                                 TextFromJson(parts.at(0)), TextFromJson(parts.at(1)),
+                                                 parts.at(2).to_number<std::uint32_t>(), TextFromJson(parts.at(3))};
+                                           });
   case EValueType::Slots:
     return ListFromJson<NMX::Slot>(
         value, [](const json::value& slot)
         { return NMX::Slot{IdFromJson(slot.as_array().at(0)), TextFromJson(slot.as_array().at(1))}; });
   case EValueType::Option:
-    return NMX::Option{WideFromJson(value.as_array().at(0)),
-                       ListFromJson<NMX::Choice>(value.as_array().at(1),
-                                                 [](const json::value& choice)
-                                                 {
-                                                   return NMX::Choice{TextFromJson(choice.as_array().at(0)),
-                                                                      WideFromJson(choice.as_array().at(1))};
-                                                 })};
+    return NMX::Option{
+        WideFromJson(value.as_array().at(0)),
+        ListFromJson<NMX::Choice>(
+            value.as_array().at(1), [](const json::value& choice)
+            { return NMX::Choice{TextFromJson(choice.as_array().at(0)), WideFromJson(choice.as_array().at(1))}; })};
   case EValueType::Action:
     return NMX::Action{value.as_array().at(0).to_number<std::uint32_t>(), TextFromJson(value.as_array().at(1))};
   }

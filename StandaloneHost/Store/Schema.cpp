@@ -132,8 +132,8 @@ std::vector<Row> Rows()
       {general, Paths::ModelOutputPluginKinex(), EValueType::Bool, false, EAspect::ModelOutputs},
   };
   for (const char* name : warningNames)
-    rows.push_back({all, NMX::EntryPath(std::string("Warnings/Warning") + name), EValueType::Bool, false,
-                    EAspect::Warnings});
+    rows.push_back(
+        {all, NMX::EntryPath(std::string("Warnings/Warning") + name), EValueType::Bool, false, EAspect::Warnings});
   return rows;
 }
 
@@ -182,10 +182,14 @@ KindSchema::KindSchema(ESubjectKind kind)
 const KindSchema& KindSchema::Of(ESubjectKind kind)
 {
   static const std::array<KindSchema, NMX::allSubjectKinds.size()> schemas{
-      KindSchema(ESubjectKind::BasicObjects),           KindSchema(ESubjectKind::SmartObjects),
-      KindSchema(ESubjectKind::CharactersFromClusters), KindSchema(ESubjectKind::GeneralSubjects),
-      KindSchema(ESubjectKind::LabellingClusters),      KindSchema(ESubjectKind::Markerless),
-      KindSchema(ESubjectKind::Props),                  KindSchema(ESubjectKind::SceneMeshes)};
+      KindSchema(ESubjectKind::BasicObjects),
+      KindSchema(ESubjectKind::SmartObjects),
+      KindSchema(ESubjectKind::CharactersFromClusters),
+      KindSchema(ESubjectKind::GeneralSubjects),
+      KindSchema(ESubjectKind::LabellingClusters),
+      KindSchema(ESubjectKind::Markerless),
+      KindSchema(ESubjectKind::Props),
+      KindSchema(ESubjectKind::SceneMeshes)};
   return schemas[static_cast<std::size_t>(kind)];
 }
 
@@ -196,8 +200,7 @@ std::uint64_t KindSchema::WarningBits()
 
 std::uint64_t KindSchema::ChildWarningBit()
 {
-  static const unsigned index =
-      Of(ESubjectKind::CharactersFromClusters).Find(Paths::WarningCFCChildWarning())->index;
+  static const unsigned index = Of(ESubjectKind::CharactersFromClusters).Find(Paths::WarningCFCChildWarning())->index;
   return std::uint64_t{1} << index;
 }
 

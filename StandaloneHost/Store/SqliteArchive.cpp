@@ -174,8 +174,7 @@ ChangeSet SqliteArchive::Load()
       const auto kind = NMX::KindFromKey(Text(subjects.get(), 1));
       if (!kind)
         throw std::runtime_error("unknown kind \"" + std::string(Text(subjects.get(), 1)) + '"');
-      auto record =
-          RecordFromText(id, *kind, std::string(Text(subjects.get(), 2)), Text(subjects.get(), 3));
+      auto record = RecordFromText(id, *kind, std::string(Text(subjects.get(), 2)), Text(subjects.get(), 3));
       content.subjects.emplace(id, ChangedSubject{std::move(record), *kind, 0x1F});
     }
     if (step != SQLITE_DONE)
@@ -187,8 +186,7 @@ ChangeSet SqliteArchive::Load()
       const NMX::TSubjectStoreId parent = subject.record->Parent();
       const auto found = content.subjects.find(parent);
       if (found != content.subjects.end())
-        std::get<std::vector<NMX::TSubjectStoreId>>(found->second.record->values[CommonValue::children])
-            .push_back(id);
+        std::get<std::vector<NMX::TSubjectStoreId>>(found->second.record->values[CommonValue::children]).push_back(id);
       else if (parent.Valid())
         throw std::runtime_error("subject " + std::to_string(id.Value()) + " has no parent " +
                                  std::to_string(parent.Value()));

@@ -95,14 +95,13 @@ IResult VEntryEditor::SetValue(Id id, NMX::EntryPath path, NMX::Value value, NMX
   const bool empties = std::holds_alternative<std::monostate>(value);
   if (empties ? entry->storage == EStorage::Bit : TypeOf(value) != entry->type)
     return EResult::InvalidType;
-  if (path == NMX::Paths::Flags() || path == NMX::Paths::ParentSubjectId() ||
-      path == NMX::Paths::ParentSubjectSlotId())
+  if (path == NMX::Paths::Flags() || path == NMX::Paths::ParentSubjectId() || path == NMX::Paths::ParentSubjectSlotId())
   {
     if (empties)
       return EResult::InvalidType;
   }
-  if (path == NMX::Paths::Flags() && ((std::get<std::uint32_t>(value) ^ NMX::KindFlags(record->kind)) &
-                                      NMX::SubjectFlag::objectKindMask) != 0)
+  if (path == NMX::Paths::Flags() &&
+      ((std::get<std::uint32_t>(value) ^ NMX::KindFlags(record->kind)) & NMX::SubjectFlag::objectKindMask) != 0)
     return EResult::InvalidValue;
   if (record->Get(*entry) == value)
     return EResult::Ok;
@@ -136,15 +135,13 @@ void VEntryEditor::MoveUnder(Id id, Id parent)
     record.values[CommonValue::parentSlot] = Id{};
     return;
   }
-  auto& siblings =
-      std::get<std::vector<Id>>(m_draft.Change(parent, EAspect::Parameters).values[CommonValue::children]);
+  auto& siblings = std::get<std::vector<Id>>(m_draft.Change(parent, EAspect::Parameters).values[CommonValue::children]);
   siblings.insert(std::lower_bound(siblings.begin(), siblings.end(), id), id);
 }
 
 void VEntryEditor::RemoveChild(Id parent, Id child)
 {
-  auto& siblings =
-      std::get<std::vector<Id>>(m_draft.Change(parent, EAspect::Parameters).values[CommonValue::children]);
+  auto& siblings = std::get<std::vector<Id>>(m_draft.Change(parent, EAspect::Parameters).values[CommonValue::children]);
   std::erase(siblings, child);
 }
 

@@ -10,20 +10,16 @@ const records = published.groups.flatMap(group => group.functions);
 export const callbacks = records.filter(record => record.name.endsWith('Callback'));
 export const functions = records.filter(record => !record.name.endsWith('Callback'));
 
-export const codes = {
-  Ok: 0,
-  OkButNoEffect: 1,
-  NotSupported: 0x80000005,
-  NotPermitted: 0x80000006,
-  NotSet: 0x80000009,
-  NotFound: 0x8000000a,
-  AlreadyPresent: 0x8000000c,
-  InvalidArgument: 0x8000000f,
-  InvalidName: 0x80000011,
-  InvalidFormat: 0x80000016,
-  InvalidValue: 0x8000001b,
-  ShuttingDown: 0x80000027,
-};
+const failureNames = [
+  'Failed', 'FailedWithException', 'Finished', 'Stopping', 'NotImplemented', 'NotSupported', 'NotPermitted', 'NotAvailable',
+  'NotConnected', 'NotSet', 'NotFound', 'NotRequired', 'AlreadyPresent', 'AlreadyInProgress', 'AlreadySet', 'InvalidArgument',
+  'InvalidIndex', 'InvalidName', 'InvalidId', 'InvalidHandle', 'InvalidToken', 'InvalidPointer', 'InvalidFormat', 'InvalidType',
+  'InvalidVersion', 'InvalidSession', 'InvalidInfo', 'InvalidValue', 'InvalidSettings', 'ProtocolFailure', 'NetworkFailure',
+  'AllocationFailure', 'SerialisationFailure', 'FileIOFailure', 'TimedOut', 'WouldBlock', 'EndOfData', 'Conflict', 'FileNotOpen',
+  'ShuttingDown', 'DiskFull', 'Canceled', 'FileNotFound'];
+
+// The result codes as unsigned numbers, by name.
+export const codes = { Ok: 0, OkButNoEffect: 1, ...Object.fromEntries(failureNames.map((name, i) => [name, 0x80000000 + i])) };
 
 export const changed = 'BasicObjectServices.BasicObjectChangedCallback';
 

@@ -311,8 +311,8 @@ describe('notifications', () => {
         assertSubscription(await connection.call('Server.Subscribe', [changed]), connection, 'Ok')));
       const colours = Array.from({ length: 3000 }, (_, i) => `#${(0x100000 + i).toString(16)}`);
       await Promise.all(colours.map((colour, i) => edit([one, another][i % 2], colour)));
+      await Promise.all([one, another].map(connection => connection.call('BasicObjectServices.BasicObjectList')));
       const now = assertSubscription(await one.call('Server.Subscribe', [changed]), one, 'OkButNoEffect');
-      await another.call('BasicObjectServices.BasicObjectList');
       for (const [i, { notifications }] of [one, another].entries()) {
         const received = notifications.map(({ params }) => params.sequence);
         assert.deepEqual(received, [...new Set(received)].sort((a, b) => a - b));
@@ -406,8 +406,7 @@ describe('HTTP', () => {
     ];
     for (const [method, path, status, type] of table) {
       const answer = await request(host, { method, path, body: method === 'GET' ? undefined : variant({}) });
-      const wanted = status < 10 ? Math.floor(answer.status / 100) : answer.status;
-      assert.equal(wanted, status, `${method} ${path}: ${answer.status}`);
+      assert.match(String(answer.status), new RegExp(`^${status}`), `${method} ${path}`);
       if (status === 405)
         assert.ok(answer.headers.allow, `${method} ${path} tells what is allowed`);
       if (type)
