@@ -70,7 +70,9 @@ IResult ArgumentReader::Character(char expected, std::string_view name)
 
 IResult ArgumentReader::Begin()
 {
-  return Character('[', "an array of arguments");
+  const IResult bracket = Character('[', "an array of arguments");
+  m_begun = bracket.Succeeded();
+  return bracket;
 }
 
 IResult ArgumentReader::End()

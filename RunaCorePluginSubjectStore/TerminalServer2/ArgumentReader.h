@@ -31,6 +31,9 @@ public:
   /// What was expected where reading failed, such as "a text"; empty while nothing has failed.
   [[nodiscard]] std::string_view Expected() const { return m_expected; }
 
+  /// True once the opening bracket has been read.
+  [[nodiscard]] bool Begun() const { return m_begun; }
+
 private:
   NMX::IResult Character(char expected, std::string_view name);
 
@@ -41,6 +44,7 @@ private:
 
   std::string_view& m_text;
   std::string_view m_expected;
+  bool m_begun = false;
   bool m_first = true;
 };
 

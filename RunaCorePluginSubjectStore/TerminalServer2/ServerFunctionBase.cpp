@@ -102,6 +102,8 @@ void ServerFunctionBase::FinishOutstanding(IResult result)
 
 std::string ServerFunctionBase::Complaint(const ArgumentReader& reader, std::size_t argumentsRead) const
 {
+  if (!reader.Begun())
+    return "expected " + std::string(reader.Expected());
   // The inputs are what the caller sent; outputs only have their place in the record.
   std::size_t input = 0;
   const auto types = Arguments();

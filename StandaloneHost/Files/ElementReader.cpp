@@ -133,13 +133,14 @@ private:
     const qsizetype end = m_xml.characterOffset();
     if (m_xml.error() == QXmlStreamReader::PrematureEndOfDocumentError)
       Fail(PlaceAt(end), "the file ends too early, expected " + (m_open.empty() ? "an element" : Tag('/' + Open())));
+    std::string reason = ToText(m_xml.errorString());
+    while (reason.ends_with('.'))
+      reason.pop_back();
+    if (!m_open.empty() && !reason.starts_with("Expected"))
+      reason += ", expected content or " + Tag('/' + Open());
     const bool inTag = end > 0 && m_text[end - 1] == u'>';
-    std::string problem = "not well-formed XML: " + ToText(m_xml.errorString());
-    while (problem.ends_with('.'))
-      problem.pop_back();
-    if (!m_open.empty())
-      problem += ", expected the content of " + Tag(Open()) + " or its end";
-    Fail(PlaceAt(inTag ? TagBegin() : std::max<qsizetype>(end - 1, 0)), problem);
+    Fail(PlaceAt(inTag ? TagBegin() : std::max<qsizetype>(end - 1, 0)),
+         "not well-formed XML" + (m_open.empty() ? "" : " in " + Tag(Open())) + ": " + reason);
   }
 
   /// The place of a character; characters are asked for in ascending order.

@@ -12,6 +12,8 @@ namespace Store
 using NMX::EResult;
 using NMX::IResult;
 
+VStore::VStore() : VStore(nullptr) {}
+
 VStore::VStore(std::unique_ptr<IArchive> archive) : m_archive(std::move(archive))
 {
   for (auto& callback : m_kindCallbacks)

@@ -22,8 +22,11 @@ class IArchive;
 class VStore : public NMX::IStore, public NMX::VShared, private ICommitter
 {
 public:
-  /// Without an archive nothing is kept. Throws ArchiveError when the archive cannot be read.
-  explicit VStore(std::unique_ptr<IArchive> archive = nullptr);
+  /// A store that keeps nothing.
+  VStore();
+
+  /// Starts from what the archive holds. Throws ArchiveError when it cannot be read.
+  explicit VStore(std::unique_ptr<IArchive> archive);
   ~VStore() override;
 
   [[nodiscard]] std::unique_ptr<const NMX::IStoreReader> Reader() const override;

@@ -77,9 +77,13 @@ export function configuration(subjects) {
 }
 
 function launch(options) {
-  const child = spawn(binary, options, { stdio: ['ignore', 'ignore', 'pipe'] });
+  const child = spawn(binary, options, { stdio: ['ignore', 'pipe', 'pipe'] });
   running.add(child);
   const process = { child, stderr: '' };
+  process.listening = new Promise(done => child.stdout.setEncoding('utf8').on('data', text => {
+    if (text.includes('listening'))
+      done({ status: 'listening' });
+  }));
   child.stderr.setEncoding('utf8').on('data', text => { process.stderr += text; });
   process.ended = new Promise((done, failed) => {
     child.on('error', failed);
@@ -100,7 +104,8 @@ function assertNoSanitizerReport(stderr) {
 export async function refusedStart(options) {
   const process = launch(['--headless', ...options]);
   try {
-    const { status, signal } = await inTime(process.ended, `${options.join(' ')} ends the host`, 10000);
+    const { status, signal } = await inTime(Promise.race([process.ended, process.listening]),
+                                            `${options.join(' ')} ends the host`, 10000);
     assertNoSanitizerReport(process.stderr);
     return { status, signal, lines: process.stderr.split('\n').filter(line => line !== '') };
   } finally {

@@ -68,7 +68,7 @@ export class Connection {
     const id = ++this.#lastId;
     const answer = new Promise((done, failed) => this.#calls.set(id, { done, failed }));
     this.socket.send(JSON.stringify({ jsonrpc: '2.0', id, method, params }));
-    return inTime(answer, `an answer to ${method}`, 15000);
+    return inTime(answer, `an answer to ${method}`);
   }
 
   notify(method, params) {
@@ -91,8 +91,8 @@ export class Connection {
     return this.#others;
   }
 
-  async close() {
-    this.socket.close();
+  async close(code) {
+    this.socket.close(code);
     return inTime(this.closed, 'the connection closes');
   }
 

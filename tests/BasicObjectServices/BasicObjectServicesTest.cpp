@@ -1,0 +1,248 @@
+#include "RunaCorePluginSubjectStore/BasicObjectServices/VBasicObjectServices.h"
+#include "StandaloneHost/Store/VStore.h"
+#include "StoreInterface/EntryPaths.h"
+#include "StoreInterface/TypedAccess.h"
+#include "tests/Support/LogCapture.h"
+#include "tests/Support/MockStore.h"
+
+#include <gmock/gmock.h>
+
+#include <stdexcept>
+
+using NMX::EResult;
+using NMX::IResult;
+using testing::_;
+using testing::AllOf;
+using testing::ElementsAre;
+using testing::Ge;
+using testing::NiceMock;
+using testing::Pair;
+using testing::Return;
+using testing::SetArgReferee;
+namespace Paths = NMX::Paths;
+
+namespace
+{
+
+class BasicObjectServicesTest : public testing::Test
+{
+protected:
+  BasicObjectServicesTest()
+  {
+    const auto editor = store->Editor();
+    crate = Add(*editor, NMX::ESubjectKind::BasicObjects, "Crate");
+    Add(*editor, NMX::ESubjectKind::BasicObjects, "Sword");
+    Add(*editor, NMX::ESubjectKind::SmartObjects, "Glove");
+    Add(*editor, NMX::ESubjectKind::CharactersFromClusters, "Ada");
+    EXPECT_TRUE(editor->Commit().Succeeded());
+  }
+
+  static NMX::TSubjectStoreId Add(NMX::IEntryEditor& editor, NMX::ESubjectKind kind, const char* name)
+  {
+    NMX::TSubjectStoreId id;
+    EXPECT_TRUE(editor.Add(kind, name, id).Succeeded());
+    return id;
+  }
+
+  void Set(NMX::TSubjectStoreId id, NMX::EntryPath path, NMX::Value value)
+  {
+    const auto editor = store->Editor();
+    EXPECT_TRUE(editor->SetValue(id, path, std::move(value)).Succeeded());
+    EXPECT_TRUE(editor->Commit().Succeeded());
+  }
+
+  std::set<std::string> List()
+  {
+    std::set<std::string> names;
+    EXPECT_TRUE(service->BasicObjectList(names).Succeeded());
+    return names;
+  }
+
+  std::shared_ptr<Store::VStore> store = NMX::MakeShared<Store::VStore>();
+  std::shared_ptr<NMX::IBasicObjectServices> service =
+      NMX::MakeShared<BasicObjectServices::VBasicObjectServices>(store);
+  NMX::TSubjectStoreId crate;
+};
+
+}
+
+TEST_F(BasicObjectServicesTest, EveryOperationRefusesUnknownNamesAndOtherKinds)
+{
+  bool flag = true;
+  std::string text = "untouched";
+  std::map<NMX::IBasicObjectServices::EBasicObjectWarning, std::string> warnings;
+  const std::function<IResult(const std::string&)> operations[] = {
+      [&](auto& name) { return service->Remove(name); },
+      // A bad new name is only looked at once the object has been found.
+      [&](auto& name) { return service->Rename(name, " bad "); },
+      [&](auto& name) { return service->Enabled(name, flag); },
+      [&](auto& name) { return service->SetEnabled(name, false); },
+      [&](auto& name) { return service->Color(name, text); },
+      [&](auto& name) { return service->SetColor(name, "bad"); },
+      [&](auto& name) { return service->ProximityGroupName(name, text); },
+      [&](auto& name) { return service->SetProximityGroupName(name, "x"); },
+      [&](auto& name) { return service->TemplateGroupName(name, text); },
+      [&](auto& name) { return service->SetTemplateGroupName(name, "x"); },
+      [&](auto& name) { return service->AutoAssignEnabled(name, flag); },
+      [&](auto& name) { return service->SetAutoAssignEnabled(name, true); },
+      [&](auto& name) { return service->AutoAssignedName(name, text); },
+      [&](auto& name) { return service->BasicObjectWarnings(name, warnings); },
+  };
+  for (std::size_t i = 0; i < std::size(operations); ++i)
+  {
+    EXPECT_EQ(operations[i]("Nobody"), IResult(EResult::NotFound)) << i;
+    EXPECT_EQ(operations[i](""), IResult(EResult::NotFound)) << i;
+    EXPECT_EQ(operations[i]("Glove").Code(), 0x8000000FU) << i;
+    EXPECT_EQ(operations[i]("Ada").Code(), 0x8000000FU) << i;
+  }
+  EXPECT_TRUE(flag);
+  EXPECT_EQ(text, "untouched");
+}
+
+TEST_F(BasicObjectServicesTest, GettersAnswerWhatTheSettersSet)
+{
+  bool flag = true;
+  std::string text;
+  EXPECT_TRUE(service->SetEnabled("Crate", false).Succeeded());
+  EXPECT_TRUE(service->Enabled("Crate", flag).Succeeded());
+  EXPECT_FALSE(flag);
+  EXPECT_TRUE(service->SetAutoAssignEnabled("Crate", true).Succeeded());
+  EXPECT_TRUE(service->AutoAssignEnabled("Crate", flag).Succeeded());
+  EXPECT_TRUE(flag);
+  EXPECT_TRUE(service->SetColor("Crate", "#FF0000").Succeeded());
+  EXPECT_EQ(service->SetColor("Crate", "#ff000"), IResult(EResult::InvalidArgument));
+  EXPECT_TRUE(service->Color("Crate", text).Succeeded());
+  EXPECT_EQ(text, "#ffff0000");
+  EXPECT_TRUE(service->SetProximityGroupName("Crate", "Shelf").Succeeded());
+  EXPECT_TRUE(service->ProximityGroupName("Crate", text).Succeeded());
+  EXPECT_EQ(text, "Shelf");
+  EXPECT_TRUE(service->SetTemplateGroupName("Crate", "Crates").Succeeded());
+  EXPECT_TRUE(service->TemplateGroupName("Crate", text).Succeeded());
+  EXPECT_EQ(text, "Crates");
+  EXPECT_TRUE(service->ProximityGroupName("Sword", text).Succeeded());
+  EXPECT_EQ(text, "") << "an object in no group";
+
+  EXPECT_EQ(service->AutoAssignedName("Crate", text), IResult(EResult::NotSet));
+  Set(crate, Paths::AutoAssignedName(), std::string("LeftHand"));
+  EXPECT_TRUE(service->AutoAssignedName("Crate", text).Succeeded());
+  EXPECT_EQ(text, "LeftHand");
+}
+
+TEST_F(BasicObjectServicesTest, RenameChecksTheNewNameAndChangesNothingWhenItRefuses)
+{
+  const struct
+  {
+    const char* name;
+    EResult result;
+  } cases[] = {
+      {" Box", EResult::InvalidName},     {"Box ", EResult::InvalidName},     {" ", EResult::InvalidName},
+      {"", EResult::InvalidName},         {"Bo\nx", EResult::InvalidName},    {"A/B", EResult::InvalidName},
+      {"Sword", EResult::AlreadyPresent}, {"Glove", EResult::AlreadyPresent}, {"Ada", EResult::AlreadyPresent}};
+  for (const auto& c : cases)
+    EXPECT_EQ(service->Rename("Crate", c.name), IResult(c.result)) << c.name;
+  EXPECT_EQ(service->Rename("Crate", std::string(256, 'x')), IResult(EResult::InvalidName));
+  EXPECT_THAT(List(), ElementsAre("Crate", "Sword"));
+
+  EXPECT_TRUE(service->Rename("Crate", "Crate").Succeeded());
+  EXPECT_TRUE(service->Rename("Crate", "Wooden box \xC3\xA9").Succeeded());
+  EXPECT_THAT(List(), ElementsAre("Sword", "Wooden box \xC3\xA9"));
+}
+
+TEST_F(BasicObjectServicesTest, WarningsAreThoseThatHoldInTheirOrderWithTheirTexts)
+{
+  using Warning = NMX::IBasicObjectServices::EBasicObjectWarning;
+  std::map<Warning, std::string> warnings{{Warning::ObjectConfusion, "stale"}};
+  EXPECT_TRUE(service->BasicObjectWarnings("Crate", warnings).Succeeded());
+  EXPECT_TRUE(warnings.empty());
+
+  Set(crate, NMX::EntryPath("Warnings/WarningObjectConfusion"), true);
+  Set(crate, NMX::EntryPath("Warnings/WarningProximityGroupMissingUnique"), true);
+  Set(crate, NMX::EntryPath("Warnings/WarningBatteryLow"), true); // not one of a basic object
+  EXPECT_TRUE(service->BasicObjectWarnings("Crate", warnings).Succeeded());
+  EXPECT_THAT(warnings, ElementsAre(Pair(Warning::ProximityGroupMissingUnique, "Proximity group has no unique object."),
+                                    Pair(Warning::ObjectConfusion,
+                                         "Object could be confused with another object, or another view of itself.")));
+}
+
+TEST_F(BasicObjectServicesTest, ListWideOperationsReachBasicObjectsOnly)
+{
+  EXPECT_TRUE(service->SetAllEnabled(false).Succeeded());
+  bool flag = true;
+  EXPECT_TRUE(service->Enabled("Sword", flag).Succeeded());
+  EXPECT_FALSE(flag);
+
+  EXPECT_TRUE(service->RemoveAll().Succeeded());
+  EXPECT_TRUE(List().empty());
+  EXPECT_TRUE(service->RemoveAll().Succeeded());
+  NMX::TSubjectStoreId id;
+  const auto reader = store->Reader();
+  EXPECT_TRUE(reader->FindByName("Glove", id).Succeeded());
+  EXPECT_TRUE(NMX::Read(*reader, id, Paths::Enabled(), flag).Succeeded());
+  EXPECT_TRUE(flag);
+}
+
+namespace
+{
+
+/// A service over a store whose editor the test decides.
+struct Refusing
+{
+  explicit Refusing(std::unique_ptr<NiceMock<MockEditor>> editor)
+  {
+    ON_CALL(*editor, Subjects(_, _))
+        .WillByDefault(testing::DoAll(SetArgReferee<1>(std::vector{NMX::TSubjectStoreId(1), NMX::TSubjectStoreId(2)}),
+                                      Return(EResult::Ok)));
+    ON_CALL(*store, Editor()).WillByDefault(Return(testing::ByMove(std::move(editor))));
+  }
+
+  std::shared_ptr<NiceMock<MockStore>> store = std::make_shared<NiceMock<MockStore>>();
+  std::shared_ptr<NMX::IBasicObjectServices> service =
+      NMX::MakeShared<BasicObjectServices::VBasicObjectServices>(store);
+};
+
+}
+
+TEST(BasicObjectServicesOverARefusingStore, RemoveAllSucceedsAlthoughEachRemovalIsRefused)
+{
+  auto editor = std::make_unique<NiceMock<MockEditor>>();
+  EXPECT_CALL(*editor, Remove(_)).Times(2).WillRepeatedly(Return(EResult::NotPermitted));
+  Refusing refusing(std::move(editor));
+  EXPECT_EQ(refusing.service->RemoveAll(), IResult(EResult::Ok));
+}
+
+TEST(BasicObjectServicesOverARefusingStore, FailuresOfListingAndKeepingComeThrough)
+{
+  auto listing = std::make_unique<NiceMock<MockEditor>>();
+  EXPECT_CALL(*listing, Subjects(_, _)).WillOnce(Return(EResult::NotAvailable));
+  EXPECT_EQ(Refusing(std::move(listing)).service->RemoveAll(), IResult(EResult::NotAvailable));
+
+  auto keeping = std::make_unique<NiceMock<MockEditor>>();
+  EXPECT_CALL(*keeping, Commit()).WillOnce(Return(EResult::DiskFull));
+  EXPECT_EQ(Refusing(std::move(keeping)).service->RemoveAll(), IResult(EResult::DiskFull));
+
+  auto setting = std::make_unique<NiceMock<MockEditor>>();
+  EXPECT_CALL(*setting, SetValue(_, _, _, _)).WillOnce(Return(EResult::NotPermitted));
+  EXPECT_CALL(*setting, Commit()).Times(0);
+  EXPECT_EQ(Refusing(std::move(setting)).service->SetAllEnabled(true), IResult(EResult::NotPermitted));
+}
+
+TEST(BasicObjectServicesOverARefusingStore, AnExceptionBecomesAResultAndAnUnreadableNameALogLine)
+{
+  LogCapture log;
+  auto editor = std::make_unique<NiceMock<MockEditor>>();
+  EXPECT_CALL(*editor, FindByName(_, _)).WillOnce(testing::Throw(std::runtime_error("broken store")));
+  EXPECT_EQ(Refusing(std::move(editor)).service->Remove("Crate"), IResult(EResult::FailedWithException));
+  EXPECT_THAT(log.messages, ElementsAre("A subject operation failed: broken store"));
+
+  log.messages.clear();
+  Refusing refusing(std::make_unique<NiceMock<MockEditor>>());
+  auto reader = std::make_unique<NiceMock<MockEditor>>();
+  ON_CALL(*reader, Subjects(_, _))
+      .WillByDefault(testing::DoAll(SetArgReferee<1>(std::vector{NMX::TSubjectStoreId(7)}), Return(EResult::Ok)));
+  ON_CALL(*reader, Find(_, _, _)).WillByDefault(Return(EResult::InvalidId));
+  ON_CALL(*refusing.store, Reader()).WillByDefault(Return(testing::ByMove(std::move(reader))));
+  std::set<std::string> names;
+  EXPECT_TRUE(refusing.service->BasicObjectList(names).Succeeded());
+  EXPECT_TRUE(names.empty());
+  EXPECT_THAT(log.messages, ElementsAre("Failed to get subject name for store id 7"));
+}

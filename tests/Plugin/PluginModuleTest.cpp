@@ -1,0 +1,111 @@
+#include "StandaloneHost/PluginModule.h"
+#include "StandaloneHost/VPluginHost.h"
+#include "tests/Support/TemporaryFolder.h"
+
+#include "HostInterface/NMX/VShared.h"
+#include "HostInterface/TerminalServer2/IServer.h"
+#include "StandaloneHost/Postal/VAsioPostalService.h"
+#include "StandaloneHost/Store/VStore.h"
+
+#include <gmock/gmock.h>
+
+#include <dlfcn.h>
+#include <fstream>
+#include <future>
+
+namespace
+{
+
+struct CountingServer : TerminalServer2::IServer
+{
+  NMX::IResult RegisterType(TerminalServer2::Level, const TerminalServer2::TypeRecord&) override
+  {
+    ++count;
+    return NMX::EResult::Ok;
+  }
+  NMX::IResult RegisterCallback(TerminalServer2::Level, std::shared_ptr<NMX::IServerCallback>) override
+  {
+    ++count;
+    return NMX::EResult::Ok;
+  }
+  NMX::IResult RegisterFunction(TerminalServer2::Level, std::shared_ptr<NMX::IServerFunction> function) override
+  {
+    ++count;
+    kept = std::move(function);
+    return NMX::EResult::Ok;
+  }
+
+  int count = 0;
+  std::shared_ptr<NMX::IServerFunction> kept;
+};
+
+}
+
+TEST(PluginModule, ExportsThreeFunctionsThatWorkWithoutAPluginObject)
+{
+  void* module = dlopen(SUBJECT_STORE_PLUGIN_FILE, RTLD_NOW | RTLD_LOCAL);
+  ASSERT_NE(module, nullptr) << dlerror();
+  const auto revision = reinterpret_cast<PluginBuildRevisionFunction*>(dlsym(module, "PluginBuildRevision"));
+  const auto destroy = reinterpret_cast<DestroyPluginFunction*>(dlsym(module, "DestroyPlugin"));
+  ASSERT_NE(revision, nullptr);
+  ASSERT_NE(destroy, nullptr);
+  EXPECT_EQ(revision(), 155050U);
+  destroy(nullptr);
+}
+
+TEST(PluginModule, RegistersTheGroupsThatTheMaskAllowsAndSurvivesItsDestruction)
+{
+  const auto postal = NMX::MakeShared<Postal::VAsioPostalService>();
+  for (const std::uint32_t mask : {0U, 1U})
+  {
+    auto plugin = LoadPlugin(SUBJECT_STORE_PLUGIN_FILE);
+    EXPECT_STREQ(plugin->PluginName(), "");
+    EXPECT_STREQ(plugin->DisplayName(), "Subject and object UI");
+    const auto server = std::make_shared<CountingServer>();
+    VPluginHost host({NMX::MakeShared<Store::VStore>(), postal, server, std::make_shared<VPluginSettings>(mask)});
+    EXPECT_TRUE(plugin->RegisterServices(host));
+    EXPECT_EQ(server->count, mask == 0 ? 0 : 20);
+
+    // A host that still holds a function after the plugin has gone can call it: the function holds its service.
+    plugin.reset();
+    if (server->kept)
+    {
+      std::string_view text = "[\"Nobody\"]";
+      std::promise<NMX::IResult> result;
+      server->kept->Invoke(text, [&](const NMX::IServerReply& reply) { result.set_value(reply.Result()); });
+      EXPECT_EQ(result.get_future().get(), NMX::IResult(NMX::EResult::NotFound));
+    }
+  }
+  postal->Stop();
+}
+
+TEST(PluginModule, AHostWithoutServerOrSettingsIsNoReasonToFail)
+{
+  auto plugin = LoadPlugin(SUBJECT_STORE_PLUGIN_FILE);
+  VPluginHost nothing({});
+  EXPECT_TRUE(plugin->RegisterServices(nothing));
+  VPluginHost noServer({NMX::MakeShared<Store::VStore>(), nullptr, nullptr, std::make_shared<VPluginSettings>(1)});
+  EXPECT_TRUE(plugin->RegisterServices(noServer));
+}
+
+TEST(PluginModule, FilesThatAreNoPluginAreRefusedByName)
+{
+  const TemporaryFolder folder;
+  const auto textFile = folder.Path() / "text.so";
+  std::ofstream(textFile) << "not a module";
+  const auto message = [](const std::filesystem::path& file)
+  {
+    try
+    {
+      (void)LoadPlugin(file);
+    }
+    catch (const PluginError& failure)
+    {
+      return std::string(failure.what());
+    }
+    return std::string("loaded");
+  };
+  EXPECT_THAT(message(folder.Path() / "missing.so"), testing::HasSubstr("missing.so"));
+  EXPECT_THAT(message(textFile), testing::HasSubstr("text.so"));
+  EXPECT_THAT(message("libsqlite3.so.0"), testing::HasSubstr("it has no function PluginBuildRevision"));
+}
