@@ -9,8 +9,9 @@
 namespace Store
 {
 
-/// The reading operations, the same for a reader and an editor; they differ in where they find a record.
-template <class Interface>
+/// The reading operations, the same for a reader and an editor. They differ in where they find a record: `Derived` has
+/// Lookup(name) and Lookup(id), which answer a record or null.
+template <class Derived, class Interface>
 class ReaderOperations : public Interface
 {
 public:
@@ -18,7 +19,7 @@ public:
 
   NMX::IResult FindByName(std::string_view name, Id& id) const override
   {
-    const SubjectRecord* record = Lookup(name);
+    const SubjectRecord* record = Self().Lookup(name);
     if (record == nullptr)
       return NMX::EResult::NotFound;
     // What is looked up by name is nearly always read next.
@@ -81,7 +82,7 @@ public:
     const SubjectRecord* record = Record(id);
     if (record == nullptr)
       return NMX::EResult::InvalidId;
-    const SchemaEntry* entry = KindSchema::Of(record->kind).Find(path);
+    const SchemaEntry* entry = record->schema->Find(path);
     value = entry != nullptr ? &record->Get(*entry) : nullptr;
     return NMX::EResult::Ok;
   }
@@ -89,20 +90,19 @@ public:
   [[nodiscard]] std::string NamePattern() const override { return std::string(NameRule::pattern); }
 
 protected:
-  virtual const SubjectRecord* Lookup(std::string_view name) const = 0;
-  virtual const SubjectRecord* Lookup(Id id) const = 0;
-
   [[nodiscard]] const SubjectRecord* Record(Id id) const
   {
     if (m_latest != nullptr && m_latest->id == id)
       return m_latest;
-    return m_latest = Lookup(id);
+    return m_latest = Self().Lookup(id);
   }
 
   /// To be called whenever records may have moved.
   void ForgetLatest() { m_latest = nullptr; }
 
 private:
+  [[nodiscard]] const Derived& Self() const { return static_cast<const Derived&>(*this); }
+
   mutable const SubjectRecord* m_latest = nullptr;
 };
 

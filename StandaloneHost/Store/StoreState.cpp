@@ -5,18 +5,6 @@
 namespace Store
 {
 
-const SubjectRecord* StoreState::Find(NMX::TSubjectStoreId id) const
-{
-  const auto found = m_records.find(id);
-  return found != m_records.end() ? found->second.get() : nullptr;
-}
-
-const SubjectRecord* StoreState::Find(std::string_view name) const
-{
-  const auto found = m_names.find(name);
-  return found != m_names.end() ? found->second : nullptr;
-}
-
 const std::set<NMX::TSubjectStoreId>& StoreState::Subjects(NMX::ESubjectKind kind) const
 {
   return m_kinds[static_cast<std::size_t>(kind)];

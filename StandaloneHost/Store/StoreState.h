@@ -36,8 +36,18 @@ struct ChangeSet
 class StoreState
 {
 public:
-  [[nodiscard]] const SubjectRecord* Find(NMX::TSubjectStoreId id) const;
-  [[nodiscard]] const SubjectRecord* Find(std::string_view name) const;
+  [[nodiscard]] const SubjectRecord* Find(NMX::TSubjectStoreId id) const
+  {
+    const auto found = m_records.find(id);
+    return found != m_records.end() ? found->second.get() : nullptr;
+  }
+
+  [[nodiscard]] const SubjectRecord* Find(std::string_view name) const
+  {
+    const auto found = m_names.find(name);
+    return found != m_names.end() ? found->second : nullptr;
+  }
+
   [[nodiscard]] const std::set<NMX::TSubjectStoreId>& Subjects(NMX::ESubjectKind kind) const;
   [[nodiscard]] const std::map<NMX::EntryPath, NMX::Value>& ApplicationEntries() const { return m_application; }
   [[nodiscard]] NMX::TSubjectStoreId NextId() const { return m_nextId; }

@@ -1,37 +1,45 @@
 #include "StandaloneHost/Store/SubjectRecord.h"
 
+#include <memory_resource>
 #include <utility>
 
 namespace Store
 {
 
-SubjectRecord::SubjectRecord(NMX::TSubjectStoreId subjectId, NMX::ESubjectKind subjectKind, std::string subjectName)
-    : id(subjectId), bits(KindSchema::Of(subjectKind).InitialBits()), kind(subjectKind), name(std::move(subjectName))
+namespace
 {
-  const KindSchema& schema = KindSchema::Of(kind);
-  values.resize(schema.ValueCount());
-  for (const SchemaEntry& entry : schema.Entries())
+
+/// Never destroyed: records may outlive every static object.
+std::pmr::memory_resource& Pool()
+{
+  static auto* const pool = new std::pmr::synchronized_pool_resource;
+  return *pool;
+}
+
+}
+
+const NMX::Value SubjectRecord::truth[2] = {false, true};
+const NMX::Value SubjectRecord::nothing;
+
+void* SubjectRecord::operator new(std::size_t size)
+{
+  return Pool().allocate(size, alignof(SubjectRecord));
+}
+
+void SubjectRecord::operator delete(void* place, std::size_t size) noexcept
+{
+  Pool().deallocate(place, size, alignof(SubjectRecord));
+}
+
+SubjectRecord::SubjectRecord(NMX::TSubjectStoreId subjectId, NMX::ESubjectKind subjectKind, std::string subjectName)
+    : id(subjectId), schema(&KindSchema::Of(subjectKind)), name(std::move(subjectName)), kind(subjectKind)
+{
+  bits = schema->InitialBits();
+  values.resize(schema->ValueCount());
+  for (const SchemaEntry& entry : schema->Entries())
     if (entry.storage == EStorage::Value)
       values[entry.index] = entry.initial;
   values[CommonValue::subjectId] = id;
-}
-
-const NMX::Value& SubjectRecord::Get(const SchemaEntry& entry) const
-{
-  static const NMX::Value truth[2] = {false, true};
-  static const NMX::Value nothing;
-  switch (entry.storage)
-  {
-  case EStorage::Name:
-    return name;
-  case EStorage::Bit:
-    return truth[(bits >> entry.index) & 1U];
-  case EStorage::Value:
-    return values[entry.index];
-  case EStorage::Group:
-    break;
-  }
-  return nothing;
 }
 
 void SubjectRecord::Set(const SchemaEntry& entry, NMX::Value value)

@@ -21,7 +21,7 @@ protected:
 };
 
 /// Edit access: collects the changes in a draft.
-class VEntryEditor final : public ReaderOperations<NMX::IEntryEditor>
+class VEntryEditor final : public ReaderOperations<VEntryEditor, NMX::IEntryEditor>
 {
 public:
   VEntryEditor(const StoreState& state, std::mutex& editMutex, ICommitter& committer);
@@ -38,8 +38,9 @@ public:
   NMX::IResult Commit() override;
 
 private:
-  const SubjectRecord* Lookup(std::string_view name) const override { return m_draft.Find(name); }
-  const SubjectRecord* Lookup(Id id) const override { return m_draft.Find(id); }
+  friend ReaderOperations;
+  const SubjectRecord* Lookup(std::string_view name) const { return m_draft.Find(name); }
+  const SubjectRecord* Lookup(Id id) const { return m_draft.Find(id); }
 
   [[nodiscard]] NMX::IResult CheckName(std::string_view name, Id owner) const;
   NMX::IResult SetParent(Id id, Id parent);

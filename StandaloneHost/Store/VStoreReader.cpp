@@ -1,5 +1,8 @@
 #include "StandaloneHost/Store/VStoreReader.h"
 
+#include <memory>
+#include <new>
+
 namespace Store
 {
 
@@ -7,6 +10,14 @@ namespace
 {
 
 thread_local int heldByThisThread = 0;
+
+struct FreeMemory
+{
+  void operator()(void* place) const noexcept { ::operator delete(place); }
+};
+
+/// Memory for one reader that is not in use.
+thread_local std::unique_ptr<void, FreeMemory> spare;
 
 }
 
@@ -29,6 +40,16 @@ VStoreReader::VStoreReader(const StoreState& state, std::shared_mutex& mutex) : 
 VStoreReader::~VStoreReader()
 {
   --heldByThisThread;
+}
+
+void* VStoreReader::operator new(std::size_t size)
+{
+  return spare ? spare.release() : ::operator new(size);
+}
+
+void VStoreReader::operator delete(void* place, std::size_t /*size*/) noexcept
+{
+  spare.reset(place);
 }
 
 int VStoreReader::HeldByThisThread()

@@ -81,16 +81,21 @@ class Writer {
 
   // Finds how many of the edits the store has: all that were answered, and perhaps more of those that were sent.
   assertKept(stored) {
-    const expected = new Map(this.before);
-    const same = () => expected.size === stored.size && [...expected].every(([name, object]) =>
-      JSON.stringify(stored.get(name)) === JSON.stringify(object));
+    const state = new Map(this.before);
+    let differences;
     for (let count = 0; count <= this.sent.length; ++count) {
-      if (count >= this.answered && same())
-        return expected;
-      this.sent[count]?.apply(expected);
+      if (count >= this.answered) {
+        const names = new Set([...state.keys(), ...stored.keys()]);
+        const told = [...names].map(name => [name, JSON.stringify(state.get(name)), JSON.stringify(stored.get(name))])
+          .filter(([, expected, found]) => expected !== found);
+        if (told.length === 0)
+          return state;
+        differences ??= told;
+      }
+      this.sent[count]?.apply(state);
     }
-    assert.fail(`${this.answered} of ${this.sent.length} edits were answered; the store shows no state after them: ${
-      JSON.stringify([...stored])}`);
+    assert.fail(`${this.answered} of ${this.sent.length} edits were answered; what differs from the state after those:\n${
+      differences.map(([name, expected, found]) => `${name}: ${expected} expected, ${found} found`).join('\n')}`);
   }
 }
 

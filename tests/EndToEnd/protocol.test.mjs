@@ -340,13 +340,17 @@ describe('WebSocket', () => {
     return Buffer.concat([Buffer.from([...head, 0, 0, 0, 0]), payload]);
   }
 
-  test('greets first, also a client that does not wait for it', () => withHost({ subjects }, async host => {
+  async function upgraded(host) {
     const raw = await RawSocket.open(host);
     const upgrade = rawRequest(host, '', { method: 'GET', headers: [
-      'Connection: Upgrade', 'Upgrade: websocket', 'Sec-WebSocket-Version: 13', 'Sec-WebSocket-Key: dGhlIHNhbXBsZSBub25jZQ=='] })
-      .replace('Content-Length: 0\r\n', '');
-    const head = await raw.exchange(upgrade, /^HTTP\/1\.1 101 .*\r\n\r\n/s);
+      'Connection: Upgrade', 'Upgrade: websocket', 'Sec-WebSocket-Version: 13', 'Sec-WebSocket-Key: dGhlIHNhbXBsZSBub25jZQ=='] });
+    const head = await raw.exchange(upgrade.replace('Content-Length: 0\r\n', ''), /^HTTP\/1\.1 101 .*\r\n\r\n/s);
     assert.match(head, /s3pPLMBiTxaQ9kYGzzhZRbK\+xOo=/);
+    return raw;
+  }
+
+  test('greets first, also a client that does not wait for it', () => withHost({ subjects }, async host => {
+    const raw = await upgraded(host);
     const text = await raw.exchange(Buffer.concat([frame(variant({ id: 6 })), frame(variant({}))]), /"id":7/);
     assert.match(text, /Server\.Hello.*"id":6.*"id":7/s);
     raw.socket.destroy();
@@ -388,20 +392,29 @@ describe('WebSocket', () => {
     assert.deepEqual(connection.unexpected, []);
   })));
 
-  test('closes on a client that does not read its replies, and serves the others', () => withHost({ subjects }, host =>
-    withConnection(host, lazy => withConnection(host, async other => {
+  test('closes on clients that do not read their replies, and serves the others', () => withHost({ subjects }, host =>
+    withConnection(host, late => withConnection(host, async other => {
       const description = JSON.stringify(await other.call('rpc.discover')).length;
-      const calls = Math.ceil(8 * limits.outgoingBytes / description);
-      lazy.socket.pause();
-      for (let id = 1; id <= calls; ++id)
-        lazy.socket.send(`{"jsonrpc":"2.0","id":"d${id}","method":"rpc.discover"}`);
+      const calls = Array.from({ length: Math.ceil(8 * limits.outgoingBytes / description) },
+                               (_, i) => JSON.stringify({ jsonrpc: '2.0', id: `d${i}`, method: 'rpc.discover' }));
+      const never = await upgraded(host);
+      for (const { socket } of [late, never])
+        socket.pause();
+      for (const text of calls) {
+        late.socket.send(text);
+        never.socket.write(frame(text));
+      }
       for (let i = 0; i < 20; ++i) {
         assertSucceeds(await other.call(color.method, color.params), { ColorHtml: '#ff3366cc' });
         await sleep(10);
       }
-      lazy.socket.resume();
-      assert.equal(await inTime(lazy.closed, 'the lazy client is closed'), 1013);
-      assert.ok(lazy.unexpected.length < calls);
+      late.socket.resume();
+      assert.equal(await inTime(late.closed, 'the client that reads late is closed'), 1013);
+      assert.ok(late.unexpected.length < calls.length);
+
+      // Only who writes learns of the end without reading.
+      const knocking = setInterval(() => never.socket.write(frame('')), 50);
+      await inTime(never.ended, 'the client that never reads is closed', 10000).finally(() => clearInterval(knocking));
       assertSucceeds(await other.call(color.method, color.params), { ColorHtml: '#ff3366cc' });
     }))));
 });

@@ -290,7 +290,7 @@ TEST_F(SubjectConfigurationTest, RefusesMalformedFilesAndTellsWhere)
       {"<SubjectConfiguration version='1' xmlns='u'/>", "1:1: unknown attribute \"xmlns\"", "expected version"},
       {File("<Objects/>"), "1:35: unknown element <Objects>", "expected one of Devices, Presets, Subjects"},
       {File("<Devices/>\n <Devices/>"), "2:2: repeated <Devices>", "a.xml:1:35"},
-      {File("<Devices/>\xC3\xA4\xF0\x9F\x98\x80 <Devices/>"), "1:45: unexpected text"},
+      {File("<Devices/>\n x <Presets/>"), "2:2: unexpected text \"x\" in <SubjectConfiguration>"},
       {File("<!-- \xC3\xA4\xF0\x9F\x98\x80 --> <Subject/>"), "1:47: unknown element <Subject>"},
 
       // Devices and presets

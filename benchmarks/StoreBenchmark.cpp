@@ -1,0 +1,109 @@
+// Finding one of 100,000 subjects by name and reading one entry, against a bare hash lookup of the same names; and what
+// an edit costs in stores of different size.
+
+#include "StandaloneHost/Store/VStore.h"
+#include "StoreInterface/EntryPaths.h"
+#include "StoreInterface/TypedAccess.h"
+
+#include <benchmark/benchmark.h>
+#include <boost/unordered/unordered_flat_map.hpp>
+
+#include <random>
+#include <string>
+#include <vector>
+
+namespace
+{
+
+constexpr int subjectCount = 100000;
+
+std::string Name(int i)
+{
+  return "Subject " + std::to_string(i);
+}
+
+std::shared_ptr<Store::VStore> MakeStore(int count)
+{
+  auto store = NMX::MakeShared<Store::VStore>();
+  const auto editor = store->Editor();
+  for (int i = 0; i < count; ++i)
+  {
+    NMX::TSubjectStoreId id;
+    (void)editor->Add(NMX::ESubjectKind::BasicObjects, Name(i), id);
+  }
+  (void)editor->Commit();
+  return store;
+}
+
+/// The same names in the same random order for both, so that both miss the caches alike. Which one comes next depends on
+/// the answer to the one before: a caller waits for its answer, and without that the processor would overlap the bare
+/// lookups with each other, which no two calls ever are.
+const std::vector<std::string>& Questions()
+{
+  static const std::vector<std::string> questions = []
+  {
+    std::mt19937 random(7);
+    std::vector<std::string> names;
+    for (int i = 0; i < 1 << 16; ++i)
+      names.push_back(Name(static_cast<int>(random() % subjectCount)));
+    return names;
+  }();
+  return questions;
+}
+
+void BareHashLookup(benchmark::State& state)
+{
+  struct Subject
+  {
+    bool enabled = true;
+  };
+  boost::unordered_flat_map<std::string, std::unique_ptr<Subject>> table;
+  for (int i = 0; i < subjectCount; ++i)
+    table.emplace(Name(i), std::make_unique<Subject>());
+  const auto& questions = Questions();
+  std::size_t next = 0;
+  for (auto _ : state)
+  {
+    bool enabled = table.find(questions[next % questions.size()])->second->enabled;
+    benchmark::DoNotOptimize(enabled);
+    next += enabled;
+  }
+}
+
+void FindByNameAndRead(benchmark::State& state)
+{
+  const auto store = MakeStore(subjectCount);
+  const auto& questions = Questions();
+  std::size_t next = 0;
+  for (auto _ : state)
+  {
+    const auto reader = store->Reader();
+    NMX::TSubjectStoreId id;
+    bool enabled = false;
+    (void)reader->FindByName(questions[next % questions.size()], id);
+    (void)NMX::Read(*reader, id, NMX::Paths::Enabled(), enabled);
+    benchmark::DoNotOptimize(enabled);
+    next += enabled;
+  }
+}
+
+void EditOneEntry(benchmark::State& state)
+{
+  const auto store = MakeStore(static_cast<int>(state.range(0)));
+  bool enabled = false;
+  for (auto _ : state)
+  {
+    const auto editor = store->Editor();
+    NMX::TSubjectStoreId id;
+    (void)editor->FindByName("Subject 50", id);
+    (void)editor->SetValue(id, NMX::Paths::Enabled(), enabled);
+    (void)editor->Commit();
+    enabled = !enabled;
+  }
+}
+
+}
+
+BENCHMARK(BareHashLookup);
+BENCHMARK(FindByNameAndRead);
+BENCHMARK(EditOneEntry)->Arg(100)->Arg(100000);
