@@ -126,9 +126,15 @@ private:
 
     static void Flush(const std::shared_ptr<State>& state)
     {
-      if (state->sending || state->gathered.empty())
+      if (state->sending)
+      {
+        state->flushAgain = true;
+        return;
+      }
+      if (state->gathered.empty())
         return;
       state->sending = true;
+      state->flushAgain = false;
       state->sent.swap(state->gathered);
       boost::asio::async_write(state->socket, boost::asio::buffer(state->sent),
                                [state](error_code failed, std::size_t) { OnSent(state, failed); });
@@ -143,7 +149,9 @@ private:
         state->error = failed;
         state->gathered.clear();
       }
-      Flush(state);
+      // What has gathered meanwhile keeps gathering unless somebody wants it sent.
+      if (state->flushAgain || state->gathered.size() >= sendAt)
+        Flush(state);
       if (state->gathered.empty())
         if (const auto task = std::exchange(state->whenRoom, nullptr))
           task();
@@ -156,6 +164,7 @@ private:
     std::string gathered;
     std::string sent;
     bool sending = false;
+    bool flushAgain = false; // Flush was called while sending
     bool inputDrained = false;
     error_code error;
     std::function<void()> whenRoom;    // a write that waits; Beast has one at a time

@@ -11,15 +11,20 @@ export const callbacks = records.filter(record => record.name.endsWith('Callback
 export const functions = records.filter(record => !record.name.endsWith('Callback'));
 
 const failureNames = [
-  'Failed', 'FailedWithException', 'Finished', 'Stopping', 'NotImplemented', 'NotSupported', 'NotPermitted', 'NotAvailable',
-  'NotConnected', 'NotSet', 'NotFound', 'NotRequired', 'AlreadyPresent', 'AlreadyInProgress', 'AlreadySet', 'InvalidArgument',
-  'InvalidIndex', 'InvalidName', 'InvalidId', 'InvalidHandle', 'InvalidToken', 'InvalidPointer', 'InvalidFormat', 'InvalidType',
-  'InvalidVersion', 'InvalidSession', 'InvalidInfo', 'InvalidValue', 'InvalidSettings', 'ProtocolFailure', 'NetworkFailure',
-  'AllocationFailure', 'SerialisationFailure', 'FileIOFailure', 'TimedOut', 'WouldBlock', 'EndOfData', 'Conflict', 'FileNotOpen',
-  'ShuttingDown', 'DiskFull', 'Canceled', 'FileNotFound'];
+  'Failed', 'FailedWithException', 'Finished', 'Stopping', 'NotImplemented', 'NotSupported', 'NotPermitted',
+  'NotAvailable', 'NotConnected', 'NotSet', 'NotFound', 'NotRequired', 'AlreadyPresent', 'AlreadyInProgress',
+  'AlreadySet', 'InvalidArgument', 'InvalidIndex', 'InvalidName', 'InvalidId', 'InvalidHandle', 'InvalidToken',
+  'InvalidPointer', 'InvalidFormat', 'InvalidType', 'InvalidVersion', 'InvalidSession', 'InvalidInfo', 'InvalidValue',
+  'InvalidSettings', 'ProtocolFailure', 'NetworkFailure', 'AllocationFailure', 'SerialisationFailure',
+  'FileIOFailure', 'TimedOut', 'WouldBlock', 'EndOfData', 'Conflict', 'FileNotOpen', 'ShuttingDown', 'DiskFull',
+  'Canceled', 'FileNotFound'];
 
 // The result codes as unsigned numbers, by name.
-export const codes = { Ok: 0, OkButNoEffect: 1, ...Object.fromEntries(failureNames.map((name, i) => [name, 0x80000000 + i])) };
+export const codes = {
+  Ok: 0,
+  OkButNoEffect: 1,
+  ...Object.fromEntries(failureNames.map((name, i) => [name, 0x80000000 + i])),
+};
 
 export const changed = 'BasicObjectServices.BasicObjectChangedCallback';
 

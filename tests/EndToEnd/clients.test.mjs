@@ -43,9 +43,9 @@ function curl(host) {
   return {
     async call(method, params) {
       const stdout = await new Promise((done, failed) => {
-        const child = execFile('curl', ['--silent', '--show-error', '--fail', '--noproxy', '*',
-                                        '--max-time', String(scaled(5000) / 1000),
-                                        '--header', 'Content-Type: application/json', '--data-binary', '@-', `${host.url}/rpc`],
+        const options = ['--silent', '--show-error', '--fail', '--noproxy', '*', '--max-time', String(scaled(5000) / 1000),
+                         '--header', 'Content-Type: application/json', '--data-binary', '@-'];
+        const child = execFile('curl', [...options, `${host.url}/rpc`],
                                (error, text) => error ? failed(error) : done(text));
         child.stdin.end(JSON.stringify({ jsonrpc: '2.0', id: ++id, method, params }));
       });
@@ -89,7 +89,7 @@ async function jsonRpc2(host) {
   socket.on('message', text => peer.receiveAndSend(JSON.parse(text)));
   await once(socket, 'open');
   return {
-    call: (method, params) => peer.timeout(scaled(5000)).request(method, params),
+    call: (method, params) => inTime(peer.request(method, params), method),
     notification: () => mail.take(() => true, changed),
     close: () => socket.close(),
   };
@@ -101,7 +101,8 @@ function openRpc(transport) {
   client.onError(() => {});
   client.onNotification(message => mail.put(message));
   return {
-    call: (method, params) => client.request({ method, params }, scaled(5000)),
+    // Its own time-outs would outlive their calls.
+    call: (method, params) => inTime(client.request({ method, params }, null), method),
     notification: () => mail.take(message => message.method === changed, changed),
     close: () => client.close(),
   };

@@ -15,7 +15,8 @@ const inFlight = 24;
 
 // Objects of one writer; it alone edits those whose names begin with its letter.
 function objectsOf(letter) {
-  return Array.from({ length: 60 }, (_, i) => ({ name: `${letter}${i}`, enabled: true, colour: '#ffffffff', proximity: '', template: '' }));
+  const untouched = { enabled: true, colour: '#ffffffff', proximity: '', template: '' };
+  return new Map(Array.from({ length: 60 }, (_, i) => [`${letter}${i}`, untouched]));
 }
 
 function pick(list) {
@@ -25,27 +26,22 @@ function pick(list) {
 // A random edit, as a call and as what it does to the objects known by name.
 function randomEdit(objects, letter, number) {
   const name = pick([...objects.keys()]);
-  const change = (method, value, member, stored = value) => ({
-    method, params: [name, value], apply: known => known.set(name, { ...known.get(name), [member]: stored }) });
-  const kind = number % 40 === 39 && objects.size > 8 ? 'Remove' : pick(['Rename', 'SetEnabled', 'SetColor', 'Proximity', 'Template']);
-  const colour = `#${(0x01000000 + number).toString(16).padStart(8, '0')}`;
-  switch (kind) {
-  case 'Remove':
+  const change = (method, member, value) => ({
+    method, params: [name, value], apply: known => known.set(name, { ...known.get(name), [member]: value }) });
+  if (number % 40 === 39 && objects.size > 8)
     return { method: 'Remove', params: [name], apply: known => known.delete(name) };
-  case 'Rename': {
-    const to = `${letter}${number}·${'ñ'.repeat(number % 50)}`;
-    return { method: 'Rename', params: [name, to],
-             apply: known => { known.set(to, known.get(name)); known.delete(name); } };
-  }
-  case 'SetEnabled':
-    return change('SetEnabled', !objects.get(name).enabled, 'enabled');
-  case 'SetColor':
-    return change('SetColor', colour, 'colour');
-  case 'Proximity':
-    return change('SetProximityGroupName', `near ${number}`, 'proximity');
-  default:
-    return change('SetTemplateGroupName', `like ${number}`, 'template');
-  }
+  const newName = `${letter}${number}·${'ñ'.repeat(number % 50)}`;
+  const rename = known => {
+    known.set(newName, known.get(name));
+    known.delete(name);
+  };
+  return pick([
+    { method: 'Rename', params: [name, newName], apply: rename },
+    change('SetEnabled', 'enabled', !objects.get(name).enabled),
+    change('SetColor', 'colour', `#${(0x10000000 + number).toString(16)}`),
+    change('SetProximityGroupName', 'proximity', `near ${number}`),
+    change('SetTemplateGroupName', 'template', `like ${number}`),
+  ]);
 }
 
 // Sends edits with many in flight until the connection breaks; `sent` has them in order, `answered` of them came back.
@@ -102,7 +98,10 @@ class Writer {
 async function storedObjects(host) {
   const objects = new Map();
   await withConnection(host, async connection => {
-    const ask = async (name, params) => Object.values((await connection.call(`BasicObjectServices.${name}`, params)).result.outputs)[0];
+    const ask = async (name, params) => {
+      const { result } = await connection.call(`BasicObjectServices.${name}`, params);
+      return Object.values(result.outputs)[0];
+    };
     const names = await ask('BasicObjectList', []);
     await Promise.all(names.map(async name => {
       const [enabled, colour, proximity, template] = await Promise.all(
@@ -116,8 +115,8 @@ async function storedObjects(host) {
 test(`An answered edit survives a kill, ${rounds} times over`, async () => {
   const data = temporaryDirectory();
   const letters = ['A', 'B', 'C'];
-  const subjects = letters.flatMap(letter => objectsOf(letter).map(({ name }) => ({ name })));
-  let known = new Map(letters.map(letter => [letter, new Map(objectsOf(letter).map(({ name, ...object }) => [name, object]))]));
+  let known = new Map(letters.map(letter => [letter, objectsOf(letter)]));
+  const subjects = [...known.values()].flatMap(objects => [...objects.keys()].map(name => ({ name })));
   const numbers = { next: 1000 };
   let answered = 0;
   let unanswered = 0;
@@ -143,7 +142,10 @@ test(`An answered edit survives a kill, ${rounds} times over`, async () => {
 });
 
 const subjects = Array.from({ length: 200 }, (_, i) => ({
-  name: `Object ${i}`, parameters: { ColourRGBA: '#80402010', ProximityGroupName: `Group ${i}` }, markers: [[0, 0, 0], [i, 0, 0]] }));
+  name: `Object ${i}`,
+  parameters: { ColourRGBA: '#80402010', ProximityGroupName: `Group ${i}` },
+  markers: [[0, 0, 0], [i, 0, 0]],
+}));
 
 function assertRefused({ status, lines }, says) {
   assert.equal(status, 2, lines.join('\n'));

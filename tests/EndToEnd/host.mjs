@@ -63,7 +63,7 @@ function group(name, entries) {
   return content && `<${name}>${content}</${name}>`;
 }
 
-// The text of a subject configuration. A subject: { kind, name, parameters, warnings, markers }, all but the name optional.
+// The text of a subject configuration. A subject: { kind, name, parameters, warnings, markers }; the name is enough.
 export function configuration(subjects) {
   const lines = subjects.map(({ kind = 'BasicObjects', name, parameters = {}, warnings = [], markers = [] }) => {
     const positions = markers.map(([x, y, z]) => `<Marker x="${x}" y="${y}" z="${z}"/>`).join('');
@@ -72,8 +72,8 @@ export function configuration(subjects) {
                     (positions && `<Markers>${positions}</Markers>`);
     return `    <Subject kind="${kind}" name="${escaped(name)}">${content}</Subject>`;
   });
-  return ['<SubjectConfiguration version="1">', '  <Subjects>', ...lines, '  </Subjects>', '</SubjectConfiguration>', '']
-    .join('\n');
+  return ['<SubjectConfiguration version="1">', '  <Subjects>', ...lines, '  </Subjects>', '</SubjectConfiguration>',
+          ''].join('\n');
 }
 
 function launch(options) {

@@ -50,7 +50,7 @@ for (const signal of ['SIGTERM', 'SIGINT'])
     const ended = [];
     let answers = 0;
     await withHost({ data, subjects }, async host => {
-      // What might hold up the end: an idle HTTP connection, half a request, a client that does not read, one without a handshake.
+      // What might hold up the end: an idle HTTP connection, half a request, no request, a client that does not read.
       const agent = new http.Agent({ keepAlive: true });
       await request(host, { agent, method: 'GET', path: '/' });
       const half = await RawSocket.open(host);
