@@ -2,6 +2,7 @@
 
 #include <boost/asio/ip/address.hpp>
 #include <boost/program_options.hpp>
+#include <boost/regex.hpp>
 
 #include <array>
 #include <charconv>
@@ -63,6 +64,17 @@ void ParseListen(const std::string& text, Server::ServerOptions& server)
     throw OptionError("--listen: expected an IP address, got " + Quoted(address));
   server.address = address;
   server.port = ParseNumber<unsigned short>(std::string_view(text).substr(colon + 1), "listen");
+}
+
+/// An origin as browsers send it: "scheme://host" or "scheme://host:port", nothing after it.
+void CheckOrigin(const std::string& origin)
+{
+  static const boost::regex expression(R"(https?://([a-z0-9.-]+|\[[0-9a-f:.]+\])(:[0-9]{1,5})?)");
+  if (!boost::regex_match(origin, expression))
+    throw OptionError(
+        "--allow-origin: expected an origin such as https://tools.example:8080, in lower case and without "
+        "a path, got " +
+        Quoted(origin));
 }
 
 std::string ReadToken(const std::filesystem::path& file)
@@ -165,6 +177,8 @@ Request ReadOptions(int argumentCount, const char* const* arguments)
                       " can be reached from other machines, so a token is "
                       "required: --token-file FILE");
   options.server.allowedOrigins = list("allow-origin");
+  for (const std::string& origin : options.server.allowedOrigins)
+    CheckOrigin(origin);
   options.features = ParseNumber<std::uint32_t>(given("features"), "features");
   options.server.grantedLevel = ParseNumber<std::uint32_t>(given("level"), "level");
   if (options.server.grantedLevel != 1 && options.server.grantedLevel != 2)

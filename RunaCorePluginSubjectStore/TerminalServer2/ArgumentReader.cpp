@@ -23,8 +23,9 @@ constexpr double exactDouble = 9007199254740992.0;
 
 void SkipWhiteSpace(std::string_view& text)
 {
-  const auto start = text.find_first_not_of("\t\n\r ");
-  text.remove_prefix(start == std::string_view::npos ? text.size() : start);
+  const auto isWhiteSpace = [](char c) { return c == ' ' || c == '\t' || c == '\n' || c == '\r'; };
+  while (!text.empty() && isWhiteSpace(text.front()))
+    text.remove_prefix(1);
 }
 
 /// A whole number, however it is written: 7, 7.0 and 70e-1 are the same number.

@@ -22,8 +22,7 @@ std::string Shortened(std::string_view text)
 /// Names and texts of a file, and file names, may hold line ends.
 std::string OnOneLine(std::string text)
 {
-  std::replace_if(
-      text.begin(), text.end(), [](unsigned char c) { return c < 0x20 || c == 0x7F; }, ' ');
+  std::replace_if(text.begin(), text.end(), [](unsigned char c) { return c < 0x20 || c == 0x7F; }, ' ');
   return text;
 }
 

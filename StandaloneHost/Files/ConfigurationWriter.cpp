@@ -155,8 +155,8 @@ void Writer::FillSlot(const Added& character, const FillingContent& filling)
     Fail(filling.place, what + " has a parent of its own, expected none (at " + PlaceText(object.subject->place) + ")");
   const auto [known, added] = m_fillings.emplace(object.id, filling.place);
   if (!added)
-    Fail(filling.place, what + " is already in the slot at " + PlaceText(known->second) +
-                            ", expected it in one slot only");
+    Fail(filling.place,
+         what + " is already in the slot at " + PlaceText(known->second) + ", expected it in one slot only");
   SetParent(filling.place, object.id, character.id, what);
   SetValue(filling.place, object.id, Paths::ParentSubjectSlotId(), filling.slot);
 }

@@ -105,8 +105,8 @@ public:
   {
     while (m_begin < m_text.size() - 1 && m_text[m_begin].isSpace())
       ++m_begin;
-    Fail(PlaceAt(m_begin), "unexpected text " + Quoted(ToText(Text().trimmed())) + " in " + Tag(Open()) +
-                               ", expected elements only");
+    Fail(PlaceAt(m_begin),
+         "unexpected text " + Quoted(ToText(Text().trimmed())) + " in " + Tag(Open()) + ", expected elements only");
   }
 
 private:

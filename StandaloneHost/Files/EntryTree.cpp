@@ -57,8 +57,8 @@ EntryNode MakeTree(NMX::ESubjectKind kind)
 
 const EntryNode* EntryNode::Find(std::string_view child) const
 {
-  const auto found = std::find_if(children.begin(), children.end(),
-                                  [child](const EntryNode& known) { return known.name == child; });
+  const auto found =
+      std::find_if(children.begin(), children.end(), [child](const EntryNode& known) { return known.name == child; });
   return found != children.end() ? &*found : nullptr;
 }
 

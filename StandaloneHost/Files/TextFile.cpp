@@ -29,8 +29,8 @@ std::size_t CheckedSize(const std::filesystem::path& file)
   if (error)
     Fail({&file}, "the file cannot be read: " + error.message());
   if (size > maximumFileBytes)
-    Fail({&file}, "the file has " + std::to_string(size) + " bytes, expected at most " +
-                      std::to_string(maximumFileBytes));
+    Fail({&file},
+         "the file has " + std::to_string(size) + " bytes, expected at most " + std::to_string(maximumFileBytes));
   return static_cast<std::size_t>(size);
 }
 

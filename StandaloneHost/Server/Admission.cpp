@@ -47,8 +47,9 @@ bool IsOwnOrigin(std::string_view origin, std::string_view host)
 EAdmission Admit(const Visitor& visitor, const ServerOptions& options)
 {
   constexpr std::string_view scheme = "Bearer ";
-  if (!options.token.empty() && (!visitor.authorisation.starts_with(scheme) ||
-                                 !SameSecret(visitor.authorisation.substr(scheme.size()), options.token)))
+  if (!options.token.empty() && !visitor.preflight &&
+      (!visitor.authorisation.starts_with(scheme) ||
+       !SameSecret(visitor.authorisation.substr(scheme.size()), options.token)))
     return EAdmission::NoToken;
   if (options.token.empty() && !visitor.host.empty() && !IsOwnHost(visitor.host))
     return EAdmission::WrongHost;

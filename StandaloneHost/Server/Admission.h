@@ -13,6 +13,7 @@ struct Visitor
   std::string_view host;          ///< header Host
   std::string_view origin;        ///< header Origin; empty unless a web page asks
   std::string_view authorisation; ///< header Authorization
+  bool preflight = false;         ///< a browser's question whether a page may ask; carries no token
 };
 
 enum class EAdmission

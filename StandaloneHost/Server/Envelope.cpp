@@ -1,5 +1,6 @@
 #include "StandaloneHost/Server/Envelope.h"
 
+#include <boost/container/static_vector.hpp>
 #include <boost/json/monotonic_resource.hpp>
 #include <boost/json/parse.hpp>
 #include <boost/json/stream_parser.hpp>
@@ -30,14 +31,14 @@ public:
 
   [[nodiscard]] char Peek()
   {
-    const auto start = m_rest.find_first_not_of("\t\n\r ");
-    m_rest.remove_prefix(start == std::string_view::npos ? m_rest.size() : start);
+    while (!m_rest.empty() && IsWhiteSpace(m_rest.front()))
+      m_rest.remove_prefix(1);
     if (m_rest.empty())
       throw NotJson{"the message ends too early"};
     return m_rest.front();
   }
 
-  [[nodiscard]] bool AtEnd() const { return m_rest.find_first_not_of("\t\n\r ") == std::string_view::npos; }
+  [[nodiscard]] bool AtEnd() const { return std::all_of(m_rest.begin(), m_rest.end(), IsWhiteSpace); }
 
   void Expect(char c)
   {
@@ -61,18 +62,11 @@ public:
   {
     if (Peek() != '"')
       throw NotJson{"expected a string"};
-    // Nearly all names are plain; what has escapes or is not ASCII goes through the parser.
-    for (std::size_t end = 1; end < m_rest.size(); ++end)
+    if (const std::size_t size = PlainString(); size != 0)
     {
-      const auto c = static_cast<unsigned char>(m_rest[end]);
-      if (c == '"')
-      {
-        std::string plain(m_rest.substr(1, end - 1));
-        m_rest.remove_prefix(end + 1);
-        return plain;
-      }
-      if (c < 0x20 || c > 0x7E || c == '\\')
-        break;
+      std::string plain(m_rest.substr(1, size - 2));
+      m_rest.remove_prefix(size);
+      return plain;
     }
     return std::string(Parse().as_string());
   }
@@ -80,8 +74,13 @@ public:
   /// Steps over the next value and answers its raw text. `depth`: how deep the value itself lies.
   [[nodiscard]] std::string_view Raw(std::size_t depth)
   {
-    (void)Peek();
+    const char c = Peek();
     const std::string_view before = m_rest;
+    if (const std::size_t size = c == '"' ? PlainString() : PlainNumber(); size != 0)
+    {
+      m_rest.remove_prefix(size);
+      return before.substr(0, size);
+    }
     m_depth = depth;
     (void)Parse();
     std::string_view raw = before.substr(0, before.size() - m_rest.size());
@@ -91,6 +90,36 @@ public:
   }
 
 private:
+  static bool IsWhiteSpace(char c) { return c == ' ' || c == '\t' || c == '\n' || c == '\r'; }
+
+  // Nearly all strings and numbers of a request are plain; the others go through the parser.
+
+  /// Length of the string ahead with its quotes; 0 when it has escapes, is not ASCII, or does not end.
+  [[nodiscard]] std::size_t PlainString() const
+  {
+    for (std::size_t end = 1; end < m_rest.size(); ++end)
+    {
+      const auto c = static_cast<unsigned char>(m_rest[end]);
+      if (c == '"')
+        return end + 1;
+      if (c < 0x20 || c > 0x7E || c == '\\')
+        break;
+    }
+    return 0;
+  }
+
+  /// Length of the number ahead; 0 when it is more than a few digits without a leading zero.
+  [[nodiscard]] std::size_t PlainNumber() const
+  {
+    std::size_t end = 0;
+    while (end < m_rest.size() && m_rest[end] >= '0' && m_rest[end] <= '9')
+      ++end;
+    if (end == 0 || end > 18 || (end > 1 && m_rest[0] == '0') || end == m_rest.size())
+      return 0;
+    const char next = m_rest[end];
+    return next == ',' || next == '}' || next == ']' || IsWhiteSpace(next) ? end : 0;
+  }
+
   /// The value lives until the next one is parsed.
   const json::value& Parse()
   {
@@ -148,7 +177,7 @@ void TakeMember(Request& request, const std::string& name, std::string_view raw)
   };
   if (name == "jsonrpc")
   {
-    if (raw != "\"2.0\"")
+    if (raw.front() != '"' || Scanner(raw, 1).String() != "2.0")
       complain("\"jsonrpc\" must be \"2.0\"");
   }
   else if (name == "method")
@@ -185,7 +214,7 @@ Request ReadRequest(Scanner& scanner, std::size_t depth)
     return request;
   }
   scanner.Expect('{');
-  std::vector<std::string> names;
+  boost::container::static_vector<std::string, maximumMembers> names;
   std::optional<Complaint> excess;
   for (bool more = scanner.Peek() != '}' || scanner.More('}'); more; more = scanner.More('}'))
   {

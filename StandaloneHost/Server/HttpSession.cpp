@@ -113,8 +113,10 @@ private:
     const auto& request = m_parser->get();
     m_keepAlive = request.keep_alive() && !m_core->closing;
     m_origin = request[http::field::origin];
-    const EAdmission admission = Admit(
-        {ToView(request[http::field::host]), m_origin, ToView(request[http::field::authorization])}, m_core->options);
+    const EAdmission admission =
+        Admit({ToView(request[http::field::host]), m_origin, ToView(request[http::field::authorization]),
+               request.method() == http::verb::options},
+              m_core->options);
     if (admission != EAdmission::Welcome)
     {
       m_origin.clear();

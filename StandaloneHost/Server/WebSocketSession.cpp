@@ -95,10 +95,10 @@ private:
 
   void OnRead(error_code error)
   {
-    m_reading = false;
     m_stream.next_layer().InputArrived();
     if (error)
     {
+      m_reading = false;
       // The client has gone, or Beast has already told it what it did wrong.
       m_closing = true;
       m_core->notifier.Forget(*this);
@@ -106,14 +106,19 @@ private:
       m_stream.next_layer().Flush();
       return;
     }
-    if (m_closing)
-    {
-      m_buffer.clear();
-      return;
-    }
-    if (!m_stream.got_text())
-      return Close(websocket::close_code::unknown_data, "text frames only");
+    if (!m_closing && m_stream.got_text())
+      Handle();
+    else if (!m_closing)
+      Close(websocket::close_code::unknown_data, "text frames only");
+    // Until here the message lies in the buffer, so nothing is read into it, even when the answer is given at once.
+    m_buffer.clear();
+    m_reading = false;
+    Read();
+    FlushWhenIdle();
+  }
 
+  void Handle()
+  {
     const auto data = m_buffer.cdata();
     const std::string_view text(static_cast<const char*>(data.data()), data.size());
     try
@@ -127,9 +132,6 @@ private:
       NMX::Log(NMX::serverLog, NMX::ESeverity::Error, "A message could not be handled: %1%", failure.what());
       Close(websocket::close_code::internal_error, "the message could not be handled");
     }
-    m_buffer.clear();
-    Read();
-    FlushWhenIdle();
   }
 
   void OnAnswer(std::string answer, std::size_t calls)

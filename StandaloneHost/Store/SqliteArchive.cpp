@@ -5,6 +5,7 @@
 
 #include <sqlite3.h>
 
+#include <algorithm>
 #include <utility>
 #include <vector>
 
@@ -158,8 +159,12 @@ ChangeSet SqliteArchive::Load()
     if (sqlite3_step(check.get()) != SQLITE_ROW)
       Fail("cannot read the file");
     if (Text(check.get(), 0) != "ok")
-      throw ArchiveError("cannot use the store \"" + m_file + "\": the file is damaged (" +
-                         std::string(Text(check.get(), 0)) + "); it was left as it is");
+    {
+      std::string report(Text(check.get(), 0));
+      std::replace(report.begin(), report.end(), '\n', ' ');
+      throw ArchiveError("cannot use the store \"" + m_file + "\": the file is damaged (" + report +
+                         "); it was left as it is");
+    }
   }
 
   std::string where;

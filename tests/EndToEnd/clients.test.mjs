@@ -43,8 +43,9 @@ function curl(host) {
   return {
     async call(method, params) {
       const stdout = await new Promise((done, failed) => {
-        const options = ['--silent', '--show-error', '--fail', '--noproxy', '*', '--max-time', String(scaled(5000) / 1000),
-                         '--header', 'Content-Type: application/json', '--data-binary', '@-'];
+        const options = ['--silent', '--show-error', '--fail', '--noproxy', '*',
+                         '--max-time', String(scaled(5000) / 1000), '--header', 'Content-Type: application/json',
+                         '--data-binary', '@-'];
         const child = execFile('curl', [...options, `${host.url}/rpc`],
                                (error, text) => error ? failed(error) : done(text));
         child.stdin.end(JSON.stringify({ jsonrpc: '2.0', id: ++id, method, params }));

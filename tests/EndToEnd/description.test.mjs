@@ -86,7 +86,8 @@ describe('The description', () => {
   test('has every callback and every type, in their order', () => {
     const described = document['x-callbacks'].map(({ name, description, params, 'x-level': level }) => (
       { name, description, params, level }));
-    assert.deepEqual(described, callbacks.map(({ name, description }) => ({ name, description, params: [], level: 2 })));
+    assert.deepEqual(described,
+                     callbacks.map(({ name, description }) => ({ name, description, params: [], level: 2 })));
 
     const types = published.groups.flatMap(({ name, description }) => [
       { name, description, values: [] },

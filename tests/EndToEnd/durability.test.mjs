@@ -90,7 +90,7 @@ class Writer {
       }
       this.sent[count]?.apply(state);
     }
-    assert.fail(`${this.answered} of ${this.sent.length} edits were answered; what differs from the state after those:\n${
+    assert.fail(`${this.answered} of ${this.sent.length} edits were answered; after those, the state differs:\n${
       differences.map(([name, expected, found]) => `${name}: ${expected} expected, ${found} found`).join('\n')}`);
   }
 }

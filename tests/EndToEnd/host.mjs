@@ -15,6 +15,8 @@ const slowness = Number(process.env.SUBJECT_STORE_TEST_SLOWNESS ?? 1);
 const directories = [];
 const running = new Set();
 
+for (const signal of ['SIGINT', 'SIGTERM', 'SIGHUP'])
+  process.on(signal, () => process.exit(1));
 process.on('exit', () => {
   for (const child of running)
     child.kill('SIGKILL');

@@ -5,6 +5,7 @@ import { readFileSync } from 'node:fs';
 import { join } from 'node:path';
 import { describe, test } from 'node:test';
 
+import { assertSucceeds } from './api.mjs';
 import { configuration, refusedStart, temporaryDirectory, temporaryFile, withHost } from './host.mjs';
 import { Connection, post, request, upgradeStatus } from './wire.mjs';
 
@@ -76,13 +77,15 @@ const faults = [
   ['<Subject kind="Basics" name="Barrel"></Subject>', 4], ['<Subject name="Barrel"></Subject>', 4],
   ['<Subject kind="BasicObjects"></Subject>', 4], ['<Subject kind="BasicObjects" name="Crate"></Subject>', 4],
   ['<Subject kind="BasicObjects" name=" Barrel"></Subject>', 4], ['<Subject kind="BasicObjects" name=""></Subject>', 4],
-  ['<Thing/>', 4], [barrel.replace('><', '><Things/><'), 4], [barrel.replace('><', '><Parameters><Weight>3</Weight></Parameters><'), 4],
-  [barrel.replace('><', '><Parameters><Enabled>maybe</Enabled></Parameters><'), 4],
-  [barrel.replace('><', '><Parameters>\n\n<ColourRGBA>red</ColourRGBA></Parameters><'), 6],
-  [barrel.replace('><', '><Markers>\n<Marker x="0" y="0"/></Markers><'), 5],
-  [barrel.replace('><', '><Markers>\n<Marker x="0" y="0" z="nan"/></Markers><'), 5],
-  [barrel.replace('><', '><Warnings><WarningOfNothing>true</WarningOfNothing></Warnings><'), 4],
-  [barrel.replace('Barrel', 'Barr&what;el'), 4],
+  ['<Thing/>', 4], [barrel.replace('Barrel', 'Barr&what;el'), 4],
+  ...[['<Things/>', 4],
+      ['<Parameters><Weight>3</Weight></Parameters>', 4],
+      ['<Parameters><Enabled>maybe</Enabled></Parameters>', 4],
+      ['<Parameters>\n\n<ColourRGBA>red</ColourRGBA></Parameters>', 6],
+      ['<Markers>\n<Marker x="0" y="0"/></Markers>', 5],
+      ['<Markers>\n<Marker x="0" y="0" z="nan"/></Markers>', 5],
+      ['<Warnings><WarningOfNothing>true</WarningOfNothing></Warnings>', 4],
+  ].map(([content, number]) => [barrel.replace('><', `>${content}<`), number]),
 ].map(([line, number]) => [good.replace(barrel, line), number]);
 
 faults.push(
@@ -96,9 +99,9 @@ test('A configuration with a fault is refused with its place, and nothing is kep
     const refused = await refusedStart([...listen, '--data', data, '--config', file]);
     assertRefused(refused, /\d/, text);
     const [, place] = new RegExp(`${escaped(file).source}:(\\d+):\\d+`).exec(refused.lines[0]) ?? [];
-    assert.ok(place !== undefined && Number(place) === line, `line ${line} of\n${text}\n${refused.lines[0]}`);
+    assert.equal(Number(place), line, `${text}\n${refused.lines[0]}`);
     await withHost({ data }, async host =>
-      assert.deepEqual((await post(host, 'BasicObjectServices.BasicObjectList')).result.outputs, { Names: [] }));
+      assertSucceeds(await post(host, 'BasicObjectServices.BasicObjectList'), { Names: [] }));
   }
 });
 
@@ -106,9 +109,10 @@ test('Several configurations fill a store together, or not at all', async () => 
   const data = temporaryDirectory();
   const [first, second, again] = [good, configuration([{ name: 'Apple' }]), configuration([{ name: 'Crate' }])]
     .map((text, i) => temporaryFile(`stage${i}.xml`, text));
-  assertRefused(await refusedStart([...listen, '--data', data, '--config', first, '--config', again]), escaped(again), 'a repeated name');
+  const refused = await refusedStart([...listen, '--data', data, '--config', first, '--config', again]);
+  assertRefused(refused, escaped(again), 'a repeated name');
   await withHost({ data, options: ['--config', first, '--config', second] }, async host =>
-    assert.deepEqual((await post(host, 'BasicObjectServices.BasicObjectList')).result.outputs, { Names: ['Apple', 'Barrel', 'Crate'] }));
+    assertSucceeds(await post(host, 'BasicObjectServices.BasicObjectList'), { Names: ['Apple', 'Barrel', 'Crate'] }));
 });
 
 const list = JSON.stringify({ jsonrpc: '2.0', id: 1, method: 'BasicObjectServices.BasicObjectList' });
@@ -125,10 +129,12 @@ async function assertLetsIn(host, headers, refusal) {
   return call;
 }
 
-test('A token, once asked for, has to be shown', () => withHost({ subjects, options: ['--token-file', token] }, async host => {
-  for (const Authorization of [undefined, '', 'Bearer', 'Bearer ', 'Bearer wrong', 'Bearer open sesame/42', 'Bearer open sesame/42==',
-                               'Bearer Open Sesame/42=', 'Basic open sesame/42=', 'open sesame/42=']) {
-    const refused = await assertLetsIn(host, Authorization === undefined ? {} : { Authorization }, 401);
+const tokenOptions = ['--token-file', token];
+test('A token, once asked for, has to be shown', () => withHost({ subjects, options: tokenOptions }, async host => {
+  const wrong = ['', 'Bearer', 'Bearer ', 'Bearer wrong', 'Bearer open sesame/42', 'Bearer open sesame/42==',
+                 'Bearer Open Sesame/42=', 'Basic open sesame/42=', 'open sesame/42='];
+  for (const headers of [{}, ...wrong.map(Authorization => ({ Authorization }))]) {
+    const refused = await assertLetsIn(host, headers, 401);
     assert.match(refused.headers['www-authenticate'] ?? '', /^Bearer/);
   }
   const headers = { Authorization: 'Bearer open sesame/42=' };
@@ -138,14 +144,17 @@ test('A token, once asked for, has to be shown', () => withHost({ subjects, opti
   connection.socket.terminate();
 }));
 
-test('A web page gets in from an origin that is allowed', () => withHost(
-  { subjects, options: ['--allow-origin', 'https://panel.example', '--allow-origin', 'http://localhost:3000'] }, async host => {
-    for (const Origin of [`http://127.0.0.1:${host.port}`, 'https://panel.example', 'http://localhost:3000'])
-      await assertLetsIn(host, { Origin });
-    for (const Origin of ['https://evil.example', 'null', 'http://panel.example', 'https://panel.example.evil.example',
-                          'https://panel.example:8443', 'http://127.0.0.1:1', `https://127.0.0.1:${host.port}`, 'http://localhost:3001'])
-      await assertLetsIn(host, { Origin }, 403);
-  }));
+const originOptions = ['--allow-origin', 'https://panel.example', '--allow-origin', 'http://localhost:3000'];
+test('A web page of an allowed origin gets in', () => withHost({ subjects, options: originOptions }, async host => {
+  for (const Origin of [`http://127.0.0.1:${host.port}`, 'https://panel.example', 'http://localhost:3000']) {
+    const { headers } = await assertLetsIn(host, { Origin });
+    assert.equal(headers['access-control-allow-origin'], Origin);
+  }
+  for (const Origin of ['https://evil.example', 'null', 'http://panel.example', 'https://panel.example.evil.example',
+                        'https://panel.example:8443', 'http://127.0.0.1:1', `https://127.0.0.1:${host.port}`,
+                        'http://localhost:3001'])
+    await assertLetsIn(host, { Origin }, 403);
+}));
 
 test('A foreign host name is not served', () => withHost({ subjects }, async host => {
   await assertLetsIn(host, { Host: `127.0.0.1:${host.port}` });

@@ -25,10 +25,12 @@ export function request(host, { method = 'POST', path = '/rpc', headers = {}, bo
   return inTime(exchange, `${method} ${path}`);
 }
 
+// The headers that ask for a WebSocket, with the key of which everyone knows the answer.
+export const handshake = { Connection: 'Upgrade', Upgrade: 'websocket', 'Sec-WebSocket-Version': '13',
+                           'Sec-WebSocket-Key': 'dGhlIHNhbXBsZSBub25jZQ==' };
+
 // The status that a WebSocket upgrade with these headers is answered with.
 export async function upgradeStatus(host, headers = {}) {
-  const handshake = { Connection: 'Upgrade', Upgrade: 'websocket', 'Sec-WebSocket-Version': '13',
-                      'Sec-WebSocket-Key': 'dGhlIHNhbXBsZSBub25jZQ==' };
   return (await request(host, { method: 'GET', headers: { ...handshake, ...headers } })).status;
 }
 

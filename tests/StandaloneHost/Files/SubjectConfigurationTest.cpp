@@ -168,6 +168,7 @@ TEST_F(SubjectConfigurationTest, LoadsTheExampleStage)
   EXPECT_EQ(ApplicationValue("Application/Devices/corvex1-0416/Type"), NMX::Value(std::string("Corvex1")));
   EXPECT_EQ(ApplicationValue("Application/Devices/corvex1-0416/Connected"), NMX::Value(false));
   EXPECT_EQ(ApplicationValue("Application/Devices/corvex1-0415/Charging"), NMX::Value(true));
+  EXPECT_EQ(ApplicationValue("Application/Devices/corvex1-0411/Charging"), NMX::Value(false));
   EXPECT_EQ(ApplicationValue("Application/Devices/corvex1-0411/Battery"), NMX::Value(87U));
   EXPECT_EQ(ApplicationValue("Application/Devices/corvex1-0411/Radio"), NMX::Value(12U));
   EXPECT_EQ(ApplicationValue("Application/ObjectPresets/1/Name"), NMX::Value(std::string("Set dressing")));
@@ -289,6 +290,7 @@ TEST_F(SubjectConfigurationTest, RefusesMalformedFilesAndTellsWhere)
       {"<SubjectConfiguration version='2'/>", "1:1: the version is \"2\"", "expected 1"},
       {"<SubjectConfiguration version='1' xmlns='u'/>", "1:1: unknown attribute \"xmlns\"", "expected version"},
       {File("<Objects/>"), "1:35: unknown element <Objects>", "expected one of Devices, Presets, Subjects"},
+      {File("<Devices on='1'/>"), "1:35: unknown attribute \"on\" of <Devices>", "expected none"},
       {File("<Devices/>\n <Devices/>"), "2:2: repeated <Devices>", "a.xml:1:35"},
       {File("<Devices/>\n x <Presets/>"), "2:2: unexpected text \"x\" in <SubjectConfiguration>"},
       {File("<!-- \xC3\xA4\xF0\x9F\x98\x80 --> <Subject/>"), "1:47: unknown element <Subject>"},

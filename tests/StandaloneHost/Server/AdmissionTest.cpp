@@ -37,6 +37,8 @@ TEST(Admission, LetsInWhoMayComeIn)
       {guarded, {"localhost:8420", "", "Bearer secretsecret"}, EAdmission::NoToken},
       {guarded, {"localhost:8420", "", "Basic secret"}, EAdmission::NoToken},
       {guarded, {"localhost:8420", "http://evil.example", "Bearer secret"}, EAdmission::WrongOrigin},
+      {guarded, {"localhost:8420", "http://localhost:8420", "", true}, EAdmission::Welcome},
+      {guarded, {"localhost:8420", "http://evil.example", "", true}, EAdmission::WrongOrigin},
   };
   for (const auto& c : cases)
     EXPECT_EQ(Server::Admit(c.visitor, c.options), c.admission)
