@@ -25,8 +25,8 @@ public:
   IStore& operator=(const IStore&) = delete;
   virtual ~IStore() = default;
 
-  /// Opens read access: nothing changes while it lives, so keep it briefly, and do not commit an edit on a thread
-  /// that still holds one.
+  /// Opens read access: nothing changes while it lives, so keep it briefly, and neither open nor commit an edit on a
+  /// thread that still holds one: such an edit is refused with `Conflict`.
   [[nodiscard]] virtual std::unique_ptr<const IStoreReader> Reader() const = 0;
 
   /// Opens edit access, a transaction. There is one at a time; others wait for it.

@@ -1,10 +1,10 @@
 #include "RunaCorePluginSubjectStore/BasicObjectServices/VBasicObjectServices.h"
 
 #include "RunaCorePluginSubjectStore/BasicObjectServices/BasicObjectWarnings.h"
-#include "RunaCorePluginSubjectStore/Subjects/ColourText.h"
 #include "RunaCorePluginSubjectStore/Subjects/NameCheck.h"
 #include "RunaCorePluginSubjectStore/Subjects/SubjectAccess.h"
 #include "RunaCorePluginSubjectStore/Subjects/Warnings.h"
+#include "StoreInterface/ColourText.h"
 #include "StoreInterface/EntryPaths.h"
 
 #include <utility>
@@ -80,7 +80,7 @@ IResult VBasicObjectServices::Color(const std::string& name, std::string& colorH
                                  NMX::Colour colour;
                                  const IResult read = NMX::Read(reader, id, Paths::ColourRGBA(), colour);
                                  if (read.Succeeded())
-                                   colorHtml = Subjects::ColourToText(colour);
+                                   colorHtml = NMX::ColourToText(colour);
                                  return read;
                                });
 }
@@ -91,7 +91,7 @@ IResult VBasicObjectServices::SetColor(const std::string& name, const std::strin
                                [&](NMX::IEntryEditor& editor, TSubjectStoreId id) -> IResult
                                {
                                  NMX::Colour colour;
-                                 if (const IResult read = Subjects::ColourFromText(colorHtml, colour); read.Failed())
+                                 if (const IResult read = NMX::ColourFromText(colorHtml, colour); read.Failed())
                                    return read;
                                  return editor.SetValue(id, Paths::ColourRGBA(), colour);
                                });

@@ -34,13 +34,31 @@ std::size_t CheckedSize(const std::filesystem::path& file)
   return static_cast<std::size_t>(size);
 }
 
-void CheckUtf8(const std::filesystem::path& file, std::string_view text)
+/// Far more than a tag needs. The XML reader compares the attributes of a tag with each other, which for hundreds of
+/// thousands of them takes hours.
+constexpr std::ptrdiff_t maximumTagBytes = 65536;
+
+/// Refuses text that is not UTF-8, or that would keep the XML reader busy for ever.
+void CheckText(const std::filesystem::path& file, std::string_view text)
 {
   using Utf8 = boost::locale::utf::utf_traits<char>;
+  const char* const end = text.data() + text.size();
+  const char* tag = nullptr; // the one that is open; comments and the like are none
+  Place tagPlace{&file};
   Place place{&file};
-  for (const char* next = text.data(); next != text.data() + text.size();)
+  for (const char* next = text.data(); next != end;)
   {
-    const auto character = Utf8::decode(next, text.data() + text.size());
+    const char* const here = next;
+    const auto character = Utf8::decode(next, end);
+    if (character == '<' && next != end && *next != '!')
+    {
+      tag = here;
+      tagPlace = place;
+    }
+    else if (character == '>')
+      tag = nullptr;
+    if (tag != nullptr && here - tag > maximumTagBytes)
+      Fail(tagPlace, "a tag of more than " + std::to_string(maximumTagBytes) + " bytes");
     if (character == boost::locale::utf::illegal || character == boost::locale::utf::incomplete)
       Fail(place, "this is not a UTF-8 character, expected a file in UTF-8");
     if (character == '\n')
@@ -67,7 +85,7 @@ std::string ReadTextFile(const std::filesystem::path& file)
     text.erase(0, byteOrderMark.size());
   if (text.empty())
     Fail({&file}, "the file is empty, expected XML");
-  CheckUtf8(file, text);
+  CheckText(file, text);
   return text;
 }
 

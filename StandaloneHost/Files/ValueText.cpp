@@ -1,5 +1,6 @@
 #include "StandaloneHost/Files/ValueText.h"
 
+#include "StoreInterface/ColourText.h"
 #include "StoreInterface/WideText.h"
 
 #include <charconv>
@@ -57,15 +58,10 @@ Read ReadWideText(std::string_view text)
 
 Read ReadColour(std::string_view text)
 {
-  if ((text.size() != 7 && text.size() != 9) || text.front() != '#')
+  NMX::Colour colour;
+  if (NMX::ColourFromText(text, colour).Failed())
     return std::nullopt;
-  const char* end = text.data() + text.size();
-  std::uint32_t bits = 0;
-  const auto [stop, error] = std::from_chars(text.data() + 1, end, bits, 16);
-  if (error != std::errc{} || stop != end)
-    return std::nullopt;
-  const auto channel = [bits](unsigned shift) { return static_cast<std::uint8_t>(bits >> shift); };
-  return NMX::Colour{channel(16), channel(8), channel(0), text.size() == 9 ? channel(24) : std::uint8_t{255}};
+  return colour;
 }
 
 /// How a value type is written.

@@ -14,11 +14,6 @@ constexpr std::uint8_t allAspects = 0x1F;
 
 }
 
-Draft::Draft(const StoreState& base) : m_base(base)
-{
-  m_changes.nextId = base.NextId();
-}
-
 const SubjectRecord* Draft::Find(Id id) const
 {
   const auto changed = m_changes.subjects.find(id);

@@ -15,7 +15,9 @@ class Draft
 public:
   using Id = NMX::TSubjectStoreId;
 
-  explicit Draft(const StoreState& base);
+  /// Nothing is read from the base before Begin: until then somebody else may be writing it.
+  explicit Draft(const StoreState& base) : m_base(base) {}
+  void Begin() { m_changes.nextId = m_base.NextId(); }
 
   [[nodiscard]] const SubjectRecord* Find(Id id) const;
   [[nodiscard]] const SubjectRecord* Find(std::string_view name) const;

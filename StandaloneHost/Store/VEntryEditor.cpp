@@ -1,7 +1,9 @@
 #include "StandaloneHost/Store/VEntryEditor.h"
 
+#include "HostInterface/DebugServices/CallAssertFailHandler.h"
 #include "StandaloneHost/Store/Derivation.h"
 #include "StandaloneHost/Store/NameRule.h"
+#include "StandaloneHost/Store/VStoreReader.h"
 #include "StoreInterface/EntryPaths.h"
 
 #include <algorithm>
@@ -15,24 +17,34 @@ using NMX::EResult;
 using NMX::IResult;
 
 VEntryEditor::VEntryEditor(const StoreState& state, std::mutex& editMutex, ICommitter& committer)
-    : m_edit(editMutex), m_draft(state), m_committer(committer)
+    : m_edit(editMutex, std::defer_lock), m_draft(state), m_committer(committer)
 {
+  if (VStoreReader::HeldByThisThread() == 0)
+  {
+    m_edit.lock();
+    m_draft.Begin();
+    return;
+  }
+  DebugServices::CallAssertFailHandler("no read access is held by the thread that edits", __FILE__, __LINE__);
+  m_closed = EResult::Conflict;
 }
 
 IResult VEntryEditor::Subjects(NMX::ESubjectKind kind, std::vector<Id>& ids) const
 {
+  if (!Open())
+    return m_closed;
   ids = m_draft.Subjects(kind);
   return EResult::Ok;
 }
 
 const NMX::Value* VEntryEditor::FindApplicationEntry(NMX::EntryPath path) const
 {
-  return m_draft.FindApplicationEntry(path);
+  return Open() ? m_draft.FindApplicationEntry(path) : nullptr;
 }
 
 std::vector<NMX::EntryPath> VEntryEditor::ApplicationEntries(NMX::EntryPath path) const
 {
-  return m_draft.ApplicationEntries(path);
+  return Open() ? m_draft.ApplicationEntries(path) : std::vector<NMX::EntryPath>{};
 }
 
 IResult VEntryEditor::CheckName(std::string_view name, Id owner) const
@@ -45,6 +57,8 @@ IResult VEntryEditor::CheckName(std::string_view name, Id owner) const
 
 IResult VEntryEditor::Add(NMX::ESubjectKind kind, std::string_view name, Id& id)
 {
+  if (!Open())
+    return m_closed;
   if (const IResult checked = CheckName(name, Id{}); checked.Failed())
     return checked;
   ForgetLatest();
@@ -54,6 +68,8 @@ IResult VEntryEditor::Add(NMX::ESubjectKind kind, std::string_view name, Id& id)
 
 IResult VEntryEditor::Remove(Id id)
 {
+  if (!Open())
+    return m_closed;
   const SubjectRecord* record = Record(id);
   if (record == nullptr)
     return EResult::InvalidId;
@@ -70,6 +86,8 @@ IResult VEntryEditor::Remove(Id id)
 
 IResult VEntryEditor::Rename(Id id, std::string_view name, NMX::ENotify /*notify*/)
 {
+  if (!Open())
+    return m_closed;
   const SubjectRecord* record = Record(id);
   if (record == nullptr)
     return EResult::InvalidId;
@@ -84,10 +102,12 @@ IResult VEntryEditor::Rename(Id id, std::string_view name, NMX::ENotify /*notify
 
 IResult VEntryEditor::SetValue(Id id, NMX::EntryPath path, NMX::Value value, NMX::ENotify /*notify*/)
 {
+  if (!Open())
+    return m_closed;
   const SubjectRecord* record = Record(id);
   if (record == nullptr)
     return EResult::InvalidId;
-  const SchemaEntry* entry = KindSchema::Of(record->kind).Find(path);
+  const SchemaEntry* entry = record->schema->Find(path);
   if (entry == nullptr)
     return EResult::NotFound;
   if (entry->writer == EWriter::StoreOnly)
@@ -147,6 +167,8 @@ void VEntryEditor::RemoveChild(Id parent, Id child)
 
 IResult VEntryEditor::SetApplicationEntry(NMX::EntryPath path, NMX::Value value)
 {
+  if (!Open())
+    return m_closed;
   const NMX::Value* known = m_draft.FindApplicationEntry(path);
   if (known != nullptr ? *known == value : std::holds_alternative<std::monostate>(value))
     return EResult::Ok;
@@ -156,8 +178,8 @@ IResult VEntryEditor::SetApplicationEntry(NMX::EntryPath path, NMX::Value value)
 
 IResult VEntryEditor::Commit()
 {
-  if (!m_edit.owns_lock())
-    return EResult::NotAvailable;
+  if (!Open())
+    return m_closed;
   DeriveDependents(m_draft);
   ForgetLatest();
   return m_committer.Commit(std::move(m_draft.Changes()), std::move(m_edit));

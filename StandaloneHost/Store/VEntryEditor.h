@@ -20,7 +20,8 @@ protected:
   ~ICommitter() = default;
 };
 
-/// Edit access: collects the changes in a draft.
+/// Edit access: collects the changes in a draft. Once committed, or when its thread held a read access as it was opened
+/// (waiting for others could then never end), it finds nothing and refuses every edit.
 class VEntryEditor final : public ReaderOperations<VEntryEditor, NMX::IEntryEditor>
 {
 public:
@@ -39,15 +40,17 @@ public:
 
 private:
   friend ReaderOperations;
-  const SubjectRecord* Lookup(std::string_view name) const { return m_draft.Find(name); }
-  const SubjectRecord* Lookup(Id id) const { return m_draft.Find(id); }
+  const SubjectRecord* Lookup(std::string_view name) const { return Open() ? m_draft.Find(name) : nullptr; }
+  const SubjectRecord* Lookup(Id id) const { return Open() ? m_draft.Find(id) : nullptr; }
 
+  [[nodiscard]] bool Open() const { return m_edit.owns_lock(); }
   [[nodiscard]] NMX::IResult CheckName(std::string_view name, Id owner) const;
   NMX::IResult SetParent(Id id, Id parent);
   void MoveUnder(Id id, Id parent);
   void RemoveChild(Id parent, Id child);
 
   std::unique_lock<std::mutex> m_edit;
+  NMX::IResult m_closed = NMX::EResult::NotAvailable; // the answer to edits when it is not open
   Draft m_draft;
   ICommitter& m_committer;
 };

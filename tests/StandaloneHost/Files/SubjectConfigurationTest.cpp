@@ -264,6 +264,9 @@ TEST_F(SubjectConfigurationTest, RefusesMalformedFilesAndTellsWhere)
   std::string deep = "<Parameters>";
   for (int depth = 0; depth < 100000; ++depth)
     deep += "<Parameters>";
+  std::string attributes;
+  for (int i = 0; i < 300000; ++i)
+    attributes += " a" + std::to_string(i) + "=''";
 
   const std::vector<Malformed> corpus{
       // The file as such
@@ -273,6 +276,8 @@ TEST_F(SubjectConfigurationTest, RefusesMalformedFilesAndTellsWhere)
       {"stage", "1:1: not well-formed XML"},
       {"<SubjectConfiguration version='1'>\n<Subjects><Subject \xFF", "2:20: this is not a UTF-8 character", "UTF-8"},
       {"\xFF\xFE<\0a\0", "1:1: this is not a UTF-8 character"},
+      {"<SubjectConfiguration version='1'>\n<Subjects" + attributes + "/></SubjectConfiguration>",
+       "2:1: a tag of more than 65536 bytes"},
       {"<?xml version='1.0' encoding='ISO-8859-1'?>" + File(""), "1:1: the declared encoding is \"ISO-8859-1\"",
        "expected UTF-8"},
       {"<!-- x -->\n <!DOCTYPE SubjectConfiguration>" + File(""), "2:2: a document type declaration is not allowed"},

@@ -102,7 +102,7 @@ TEST_F(ArchiveTest, KeepsEveryTypeOfValueExactly)
     EXPECT_TRUE(second->Commit().Succeeded());
   }
   const auto store = Open();
-  const auto reader = store->Reader();
+  auto reader = store->Reader();
   const auto check = [&](TSubjectStoreId id, const auto& values)
   {
     for (const auto& [path, expected] : values)
@@ -124,6 +124,7 @@ TEST_F(ArchiveTest, KeepsEveryTypeOfValueExactly)
   EXPECT_TRUE(reader->Children(ada, children).Succeeded());
   EXPECT_THAT(children, testing::ElementsAre(glove));
 
+  reader.reset();
   TSubjectStoreId next;
   EXPECT_TRUE(store->Editor()->Add(ESubjectKind::Props, "Next", next).Succeeded());
   EXPECT_GT(next, deleted) << "an id is never used again";

@@ -318,17 +318,27 @@ TEST_F(StoreTest, ChangesAreToldOncePerCommitAndKindAfterTheStoreIsReleased)
   EXPECT_EQ(smart, 0);
 }
 
-TEST_F(StoreTest, ACommitOnAThreadThatStillReadsFailsInsteadOfWaitingForEver)
+TEST_F(StoreTest, AnEditOnAThreadThatStillReadsFailsInsteadOfWaitingForEver)
 {
   static int assertions;
   assertions = 0;
   DebugServices::SetAssertFailHandler([](const char*, const char*, unsigned) { ++assertions; });
   const TSubjectStoreId crate = Add(ESubjectKind::BasicObjects, "Crate");
+  {
+    const auto editor = store->Editor();
+    EXPECT_TRUE(editor->SetValue(crate, Paths::Enabled(), false).Succeeded());
+    const auto reader = store->Reader();
+    EXPECT_EQ(editor->Commit(), IResult(EResult::Conflict));
+    EXPECT_EQ(assertions, 1);
+  }
   const auto reader = store->Reader();
   const auto editor = store->Editor();
-  EXPECT_TRUE(editor->SetValue(crate, Paths::Enabled(), false).Succeeded());
+  EXPECT_EQ(assertions, 2);
+  TSubjectStoreId id;
+  EXPECT_EQ(editor->SetValue(crate, Paths::Enabled(), false), IResult(EResult::Conflict));
+  EXPECT_EQ(editor->Add(ESubjectKind::Props, "Lamp", id), IResult(EResult::Conflict));
+  EXPECT_EQ(editor->FindByName("Crate", id), IResult(EResult::NotFound));
   EXPECT_EQ(editor->Commit(), IResult(EResult::Conflict));
-  EXPECT_EQ(assertions, 1);
   DebugServices::SetAssertFailHandler(nullptr);
 }
 

@@ -1,9 +1,8 @@
-#include "RunaCorePluginSubjectStore/Subjects/ColourText.h"
+#include "StoreInterface/ColourText.h"
 
 #include <gtest/gtest.h>
 
-using NMX::Colour;
-using namespace Subjects;
+using namespace NMX;
 
 TEST(ColourText, ReadsBothFormsAndWritesTheLongOneInLowerCase)
 {

@@ -1,12 +1,9 @@
-#include "RunaCorePluginSubjectStore/Subjects/ColourText.h"
+#include "StoreInterface/ColourText.h"
 
 #include <charconv>
 
-namespace Subjects
+namespace NMX
 {
-
-using NMX::EResult;
-using NMX::IResult;
 
 namespace
 {
@@ -18,7 +15,7 @@ constexpr bool IsHexadecimalDigit(char c)
 
 }
 
-std::string ColourToText(const NMX::Colour& colour)
+std::string ColourToText(const Colour& colour)
 {
   static constexpr std::string_view digits = "0123456789abcdef";
   std::string text = "#";
@@ -30,7 +27,7 @@ std::string ColourToText(const NMX::Colour& colour)
   return text;
 }
 
-IResult ColourFromText(std::string_view text, NMX::Colour& colour)
+IResult ColourFromText(std::string_view text, Colour& colour)
 {
   if ((text.size() != 7 && text.size() != 9) || text.front() != '#')
     return EResult::InvalidArgument;
@@ -46,7 +43,7 @@ IResult ColourFromText(std::string_view text, NMX::Colour& colour)
     text.remove_prefix(2);
     return channel;
   };
-  NMX::Colour read;
+  Colour read;
   if (text.size() == 8)
     read.alpha = nextPair();
   read.red = nextPair();

@@ -6,14 +6,14 @@
 #include <string>
 #include <string_view>
 
-namespace Subjects
+namespace NMX
 {
 
 /// The colour as "#aarrggbb", alpha first, in lower case.
-[[nodiscard]] std::string ColourToText(const NMX::Colour& colour);
+[[nodiscard]] std::string ColourToText(const Colour& colour);
 
 /// Reads "#AARRGGBB", or "#RRGGBB" with alpha 255, in either case. `InvalidArgument` for anything else; `colour` is
 /// untouched then.
-NMX::IResult ColourFromText(std::string_view text, NMX::Colour& colour);
+IResult ColourFromText(std::string_view text, Colour& colour);
 
 }
