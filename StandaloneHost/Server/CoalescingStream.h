@@ -8,6 +8,7 @@
 #include <boost/beast/core/role.hpp>
 #include <boost/beast/websocket/teardown.hpp>
 
+#include <chrono>
 #include <cstddef>
 #include <functional>
 #include <memory>
@@ -75,20 +76,35 @@ public:
         *m_state, buffers);
   }
 
-  /// Calls `task(socket)` once nothing waits to be sent any more.
-  template <class Task>
-  void WhenDrained(Task task)
+  /// Ends the stream: sends what waits, then tells the client that nothing more comes, and reads and drops what it
+  /// still sends until it closes too. To close at once would take back the last message, which says why. Calls
+  /// `handler` in the end; whoever owns the stream closes the socket of a client that takes longer than until
+  /// TeardownDeadline.
+  template <class Handler>
+  void Teardown(Handler&& handler)
   {
-    m_state->whenDrained = [socket = &m_state->socket, task = std::move(task)]() mutable { task(*socket); };
+    auto held = std::make_shared<std::decay_t<Handler>>(std::forward<Handler>(handler));
+    m_state->teardownDeadline = std::chrono::steady_clock::now() + teardownTime;
+    m_state->whenDrained = [state = m_state.get(), held]
+    {
+      error_code ignored;
+      state->socket.shutdown(Socket::shutdown_send, ignored);
+      Discard(state->shared_from_this(), [held] { (*held)(error_code{}); });
+    };
     if (m_state->sending || !m_state->gathered.empty())
       Flush();
     else
       boost::asio::post(get_executor(), [state = m_state] { State::OnSent(state, state->error); });
   }
 
+  /// When the end of the stream has taken too long; far away until it begins.
+  [[nodiscard]] std::chrono::steady_clock::time_point TeardownDeadline() const { return m_state->teardownDeadline; }
+
 private:
   static constexpr std::size_t sendAt = std::size_t{64} << 10;
   static constexpr std::size_t waitAt = std::size_t{256} << 10;
+  static constexpr std::size_t discardAtOnce = std::size_t{64} << 10;
+  static constexpr auto teardownTime = std::chrono::seconds(2);
 
   struct State : std::enable_shared_from_this<State>
   {
@@ -169,18 +185,31 @@ private:
     error_code error;
     std::function<void()> whenRoom;    // a write that waits; Beast has one at a time
     std::function<void()> whenDrained; // the end of the stream
+    std::chrono::steady_clock::time_point teardownDeadline = std::chrono::steady_clock::time_point::max();
   };
+
+  template <class Done>
+  static void Discard(const std::shared_ptr<State>& state, Done done)
+  {
+    state->sent.resize(discardAtOnce);
+    state->socket.async_read_some(boost::asio::buffer(state->sent),
+                                  [state, done = std::move(done)](error_code failed, std::size_t)
+                                  {
+                                    if (failed)
+                                      done();
+                                    else
+                                      Discard(state, done);
+                                  });
+  }
 
   std::shared_ptr<State> m_state;
 };
 
-/// Beast's hook for the end of a WebSocket over this stream: what waits is sent first.
+/// Beast's hook for the end of a WebSocket over this stream.
 template <class Handler>
-void async_teardown(boost::beast::role_type role, CoalescingStream& stream, Handler&& handler)
+void async_teardown(boost::beast::role_type /*role*/, CoalescingStream& stream, Handler&& handler)
 {
-  auto held = std::make_shared<std::decay_t<Handler>>(std::forward<Handler>(handler));
-  stream.WhenDrained([role, held](Socket& socket)
-                     { boost::beast::websocket::async_teardown(role, socket, std::move(*held)); });
+  stream.Teardown(std::forward<Handler>(handler));
 }
 
 inline void teardown(boost::beast::role_type role, CoalescingStream& stream, boost::system::error_code& error)

@@ -66,7 +66,10 @@ public:
     m_stream.next_layer().next_layer().close(ignored);
   }
 
-  [[nodiscard]] bool Overdue(Clock::time_point now) const override { return now > m_deadline; }
+  [[nodiscard]] bool Overdue(Clock::time_point now) const override
+  {
+    return now > m_deadline || now > m_stream.next_layer().TeardownDeadline();
+  }
 
   [[nodiscard]] std::weak_ptr<IConnection> Weak() override { return weak_from_this(); }
 

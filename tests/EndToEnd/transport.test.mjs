@@ -76,20 +76,26 @@ describe('WebSocket', () => {
       const description = JSON.stringify(await other.call('rpc.discover')).length;
       const calls = Array.from({ length: Math.ceil(8 * limits.outgoingBytes / description) },
                                (_, i) => JSON.stringify({ jsonrpc: '2.0', id: `d${i}`, method: 'rpc.discover' }));
-      const never = await upgraded(host);
-      for (const { socket } of [late, never])
-        socket.pause();
-      for (const text of calls) {
+      // The host says when it has judged a client; the others are served all the while.
+      const judged = async count => {
+        while (host.stderr.split('reads too slowly').length <= count) {
+          assertSucceeds(await other.call(color.method, color.params), { ColorHtml: '#ff3366cc' });
+          await sleep(10);
+        }
+      };
+      late.socket.pause();
+      for (const text of calls)
         late.socket.send(text);
-        never.socket.write(frame(text));
-      }
-      for (let i = 0; i < 20; ++i) {
-        assertSucceeds(await other.call(color.method, color.params), { ColorHtml: '#ff3366cc' });
-        await sleep(10);
-      }
+      await inTime(judged(1), 'the client that reads late is judged', 20000);
       late.socket.resume();
       assert.equal(await inTime(late.closed, 'the client that reads late is closed'), 1013);
       assert.ok(late.unexpected.length < calls.length);
+
+      const never = await upgraded(host);
+      never.socket.pause();
+      for (const text of calls)
+        never.socket.write(frame(text));
+      await inTime(judged(2), 'the client that never reads is judged', 20000);
 
       // Only who writes learns of the end without reading.
       const knocking = setInterval(() => never.socket.write(frame('')), 50);
