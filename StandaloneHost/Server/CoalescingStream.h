@@ -10,9 +10,11 @@
 
 #include <chrono>
 #include <cstddef>
+#include <cstdint>
 #include <functional>
 #include <memory>
 #include <string>
+#include <string_view>
 #include <utility>
 
 namespace Server
@@ -21,12 +23,12 @@ namespace Server
 /// A TCP socket on a concrete executor: a type-erased one costs at each operation.
 using Socket = boost::asio::basic_stream_socket<boost::asio::ip::tcp, boost::asio::io_context::executor_type>;
 
-/// A stream between a WebSocket and its socket that gathers small writes into few large ones, because one system call
-/// for each message costs more than all the rest of answering it.
+/// A stream between a WebSocket and its socket that gathers what is to be sent, because one system call for each
+/// message costs more than all the rest of answering it.
 ///
-/// A write is done as soon as it has been copied. What has gathered is sent when the reader asks the socket for more
-/// (then everything received so far has been worked through), when Flush is called, or when much has gathered. A write
-/// that comes while too much is still being sent waits. [server]
+/// A write is done as soon as it has been copied. What has gathered is sent in one go when everything that has been
+/// received is worked through (the reader asks the socket for more, and whatever is ready to run has run), when Flush
+/// is called, or when much has gathered. While too much is still being sent, there is no room for more. [server]
 class CoalescingStream
 {
 public:
@@ -51,20 +53,37 @@ public:
   next_layer_type& next_layer() { return m_state->socket; }
   const next_layer_type& next_layer() const { return m_state->socket; }
 
-  /// True while the reader waits for the socket: nothing that was received is still to be worked on.
-  [[nodiscard]] bool InputDrained() const { return m_state->inputDrained; }
-
-  /// To be called when a message has arrived.
+  /// To be called when a message has arrived: what is sent from now on gathers until the reader asks for more.
   void InputArrived() { m_state->inputDrained = false; }
 
-  /// Sends what has gathered.
+  /// Sends what has gathered, now.
   void Flush() { State::Flush(m_state); }
+
+  /// Sends what has gathered once whatever is ready to run has run.
+  void FlushSoon() { State::FlushSoon(m_state); }
+
+  [[nodiscard]] bool HasRoom() const { return m_state->HasRoom(); }
+
+  /// Calls `task` when there is room again.
+  void WhenRoom(std::function<void()> task) { m_state->whenRoom = std::move(task); }
+
+  /// Gathers one text message as a WebSocket server frames it: final, unmasked, not compressed. The frame is whole, so
+  /// it may stand between any two frames of the WebSocket's own (pong, close). Going through the WebSocket's own
+  /// writing for each message would cost as much as parsing and carrying it out.
+  void GatherText(std::string_view text)
+  {
+    m_state->AppendTextFrame(text);
+    if (m_state->inputDrained)
+      FlushSoon();
+    else if (m_state->gathered.size() >= sendAt)
+      Flush();
+  }
 
   template <class Buffers, class Handler>
   auto async_read_some(const Buffers& buffers, Handler&& handler)
   {
     m_state->inputDrained = true;
-    Flush();
+    FlushSoon();
     return m_state->socket.async_read_some(buffers, std::forward<Handler>(handler));
   }
 
@@ -110,21 +129,42 @@ private:
   {
     explicit State(Socket s) : socket(std::move(s)) {}
 
+    [[nodiscard]] bool HasRoom() const { return gathered.size() <= waitAt; }
+
+    /// A write of the WebSocket itself. Waits for room: a client that pings and never reads must not fill the memory.
     template <class Buffers, class Completion>
     void Gather(const Buffers& buffers, Completion completion)
     {
-      if (gathered.size() > waitAt && !error)
+      if (!HasRoom() && !error)
       {
         // The buffers stay valid until the completion is called.
         auto waiting = std::make_shared<Completion>(std::move(completion));
-        whenRoom = [this, buffers, waiting] { Gather(buffers, std::move(*waiting)); };
+        whenRoomForControl = [this, buffers, waiting] { Gather(buffers, std::move(*waiting)); };
         Flush(shared_from_this());
         return;
       }
       const std::size_t size = error ? 0 : Append(buffers);
-      if (gathered.size() >= sendAt)
-        Flush(shared_from_this());
+      if (inputDrained || gathered.size() >= sendAt)
+        FlushSoon(shared_from_this());
       boost::asio::post(socket.get_executor(), boost::beast::bind_front_handler(std::move(completion), error, size));
+    }
+
+    void AppendTextFrame(std::string_view text)
+    {
+      constexpr char finalText = '\x81';
+      const std::uint64_t size = text.size();
+      gathered += finalText;
+      int sizeBytes = 0;
+      if (size < 126)
+        gathered += static_cast<char>(size);
+      else
+      {
+        sizeBytes = size <= 0xFFFF ? 2 : 8;
+        gathered += static_cast<char>(sizeBytes == 2 ? 126 : 127);
+      }
+      for (int shift = 8 * (sizeBytes - 1); shift >= 0; shift -= 8)
+        gathered += static_cast<char>(size >> shift & 0xFF);
+      gathered += text;
     }
 
     template <class Buffers>
@@ -138,6 +178,18 @@ private:
         gathered.append(static_cast<const char*>(part.data()), part.size());
       }
       return gathered.size() - before;
+    }
+
+    static void FlushSoon(const std::shared_ptr<State>& state)
+    {
+      if (std::exchange(state->flushPosted, true))
+        return;
+      boost::asio::post(state->socket.get_executor(),
+                        [state]
+                        {
+                          state->flushPosted = false;
+                          Flush(state);
+                        });
     }
 
     static void Flush(const std::shared_ptr<State>& state)
@@ -168,9 +220,10 @@ private:
       // What has gathered meanwhile keeps gathering unless somebody wants it sent.
       if (state->flushAgain || state->gathered.size() >= sendAt)
         Flush(state);
-      if (state->gathered.empty())
-        if (const auto task = std::exchange(state->whenRoom, nullptr))
-          task();
+      for (auto* waiting : {&state->whenRoomForControl, &state->whenRoom})
+        if (state->HasRoom())
+          if (const auto task = std::exchange(*waiting, nullptr))
+            task();
       if (!state->sending && state->gathered.empty())
         if (const auto task = std::exchange(state->whenDrained, nullptr))
           task();
@@ -180,11 +233,13 @@ private:
     std::string gathered;
     std::string sent;
     bool sending = false;
-    bool flushAgain = false; // Flush was called while sending
+    bool flushAgain = false;  // Flush was called while sending
+    bool flushPosted = false; // FlushSoon has been called
     bool inputDrained = false;
     error_code error;
-    std::function<void()> whenRoom;    // a write that waits; Beast has one at a time
-    std::function<void()> whenDrained; // the end of the stream
+    std::function<void()> whenRoom;
+    std::function<void()> whenRoomForControl; // a write of Beast that waits; it has one at a time
+    std::function<void()> whenDrained;        // the end of the stream
     std::chrono::steady_clock::time_point teardownDeadline = std::chrono::steady_clock::time_point::max();
   };
 

@@ -188,8 +188,7 @@ std::size_t Dispatcher::Handle(std::string_view text, IListener* listener, Answe
   const std::size_t calls = message.requests.size();
   if (!message.batch)
   {
-    HandleRequest(message.requests.front(), listener,
-                  [answer = std::move(answer)](std::string reply) { answer(std::move(reply), 1); });
+    HandleRequest(message.requests.front(), listener, std::move(answer));
     return 1;
   }
   const auto batch = std::make_shared<Batch>();
@@ -197,30 +196,30 @@ std::size_t Dispatcher::Handle(std::string_view text, IListener* listener, Answe
   batch->calls = calls;
   batch->answer = std::move(answer);
   for (const Request& request : message.requests)
-    HandleRequest(request, listener, [batch](std::string reply) { batch->Take(std::move(reply)); });
+    HandleRequest(request, listener, [batch](std::string part, std::size_t) { batch->Take(std::move(part)); });
   return calls;
 }
 
-void Dispatcher::HandleRequest(const Request& request, IListener* listener, Reply reply)
+void Dispatcher::HandleRequest(const Request& request, IListener* listener, Answer answer)
 {
   const bool notification = request.id.empty();
-  const auto answerNow = [&](std::string text) { reply(notification ? std::string{} : std::move(text)); };
+  const auto answerNow = [&](std::string text) { answer(notification ? std::string{} : std::move(text), 1); };
 
   if (request.complaint)
-    reply(RpcErrorText(request.id, request.complaint->code, request.complaint->text));
+    answer(RpcErrorText(request.id, request.complaint->code, request.complaint->text), 1);
   else if (const FunctionEntry* entry = m_registry.FindFunction(request.method))
   {
     if (entry->level < m_grantedLevel)
       answerNow(FailureText(request.id, EResult::NotPermitted, entry->Meaning(EResult::NotPermitted),
                             "a preview function; the host opens these with --level 1"));
     else
-      Call(*entry, request, std::move(reply));
+      Call(*entry, request, std::move(answer));
   }
   else
     answerNow(CallServer(request, listener));
 }
 
-void Dispatcher::Call(const FunctionEntry& entry, const Request& request, Reply reply)
+void Dispatcher::Call(const FunctionEntry& entry, const Request& request, Answer answer)
 {
   std::string ordered;
   std::string_view arguments = request.params;
@@ -228,15 +227,15 @@ void Dispatcher::Call(const FunctionEntry& entry, const Request& request, Reply 
   {
     if (const auto complaint = OrderByName(arguments, entry.inputs, m_limits, ordered))
     {
-      reply(request.id.empty() ? std::string{} : RpcErrorText(request.id, complaint->code, complaint->text));
+      answer(request.id.empty() ? std::string{} : RpcErrorText(request.id, complaint->code, complaint->text), 1);
       return;
     }
     arguments = ordered;
   }
   // The entry stays until every call has been finished.
   entry.function->Invoke(
-      arguments, [id = std::string(request.id), &entry, reply = std::move(reply)](const NMX::IServerReply& finished)
-      { reply(id.empty() ? std::string{} : ReplyText(id, entry, finished)); });
+      arguments, [id = std::string(request.id), &entry, answer = std::move(answer)](const NMX::IServerReply& finished)
+      { answer(id.empty() ? std::string{} : ReplyText(id, entry, finished), 1); });
 }
 
 std::string Dispatcher::CallServer(const Request& request, IListener* listener)

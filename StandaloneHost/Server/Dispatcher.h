@@ -34,10 +34,8 @@ public:
   [[nodiscard]] const std::string& Description() const;
 
 private:
-  using Reply = std::function<void(std::string text)>;
-
-  void HandleRequest(const Request& request, IListener* listener, Reply reply);
-  void Call(const FunctionEntry& entry, const Request& request, Reply reply);
+  void HandleRequest(const Request& request, IListener* listener, Answer answer);
+  void Call(const FunctionEntry& entry, const Request& request, Answer answer);
   [[nodiscard]] std::string CallServer(const Request& request, IListener* listener);
   [[nodiscard]] std::string Subscription(const Request& request, IListener* listener);
 

@@ -23,7 +23,8 @@ namespace
 constexpr auto handshakeTime = std::chrono::seconds(10);
 constexpr auto closingTime = std::chrono::seconds(2);
 
-/// One WebSocket client: reads its messages, queues what is for it, and keeps one write going.
+/// One WebSocket client: reads its messages, and queues what is for it. Beast reads, and writes what the protocol asks
+/// for by itself (handshake, pong, close); messages go straight into the stream beneath it.
 class WebSocketSession final : public IListener,
                                public IConnection,
                                public std::enable_shared_from_this<WebSocketSession>
@@ -45,10 +46,8 @@ public:
   {
     m_deadline = Clock::now() + handshakeTime;
     m_stream.read_message_max(m_core->options.limits.messageBytes);
-    m_stream.auto_fragment(false);
-    m_stream.text(true);
     m_stream.async_accept(request, [self = shared_from_this()](error_code error) { self->OnAccepted(error); });
-    m_stream.next_layer().Flush();
+    m_stream.next_layer().FlushSoon();
   }
 
   void Notify(const SharedMessage& message, EPolicy policy, const void* callback) override
@@ -117,7 +116,8 @@ private:
     m_buffer.clear();
     m_reading = false;
     Read();
-    FlushWhenIdle();
+    if (!m_reading)
+      m_stream.next_layer().FlushSoon();
   }
 
   void Handle()
@@ -152,7 +152,7 @@ private:
     if (m_closeBegun || !m_open || (m_closing && policy != EPolicy::Reply))
       return;
     if (m_queue.Push(std::move(message), policy, callback))
-      Write();
+      Pump();
     else if (!m_closing)
     {
       NMX::Log(NMX::serverLog, NMX::ESeverity::Notice, "A client that reads too slowly is closed.");
@@ -160,36 +160,24 @@ private:
     }
   }
 
-  void Write()
+  /// Moves what waits into the stream as far as there is room.
+  void Pump()
   {
-    if (m_writing || m_closeBegun || m_queue.Empty())
-      return;
-    m_writing = true;
-    m_current = m_queue.Pop();
-    m_stream.async_write(boost::asio::buffer(*m_current),
-                         [self = shared_from_this()](error_code error, std::size_t) { self->OnWritten(error); });
-  }
-
-  void OnWritten(error_code error)
-  {
-    m_writing = false;
-    m_current.reset();
-    if (error)
-      return Abort();
-    Write();
-    if (m_writing)
-      return;
-    if (m_closing)
+    CoalescingStream& stream = m_stream.next_layer();
+    // Once the client has asked to close, nothing may follow the answer to that.
+    while (!m_queue.Empty() && stream.HasRoom() && m_stream.is_open() && !m_closeBegun)
+      stream.GatherText(*m_queue.Pop());
+    if (!m_queue.Empty())
+      stream.WhenRoom(
+          [weak = weak_from_this()]
+          {
+            if (const auto self = weak.lock())
+              self->Pump();
+          });
+    else if (m_closing)
       BeginClose();
-    else
-      FlushWhenIdle();
-  }
-
-  /// Sends what has gathered, unless a message that has already arrived will add to it.
-  void FlushWhenIdle()
-  {
-    if (!m_writing && (m_stream.next_layer().InputDrained() || !m_reading))
-      m_stream.next_layer().Flush();
+    else if (!m_reading)
+      stream.FlushSoon();
   }
 
   void Close(websocket::close_code code, const char* reason)
@@ -200,30 +188,28 @@ private:
     m_reason = websocket::close_reason(code, reason);
     m_core->notifier.Forget(*this);
     m_deadline = Clock::now() + closingTime;
-    if (!m_writing && m_queue.Empty())
+    if (m_queue.Empty())
       BeginClose();
   }
 
   void BeginClose()
   {
-    if (m_closeBegun || !m_open)
+    if (m_closeBegun || !m_open || !m_stream.is_open())
       return;
     m_closeBegun = true;
     m_stream.async_close(m_reason, [self = shared_from_this()](error_code) {});
-    m_stream.next_layer().Flush();
+    m_stream.next_layer().FlushSoon();
   }
 
   const std::shared_ptr<Core> m_core;
   websocket::stream<CoalescingStream> m_stream;
   boost::beast::flat_buffer m_buffer;
   OutgoingQueue m_queue;
-  SharedMessage m_current;
   websocket::close_reason m_reason;
   Clock::time_point m_deadline = Clock::time_point::max();
   std::ptrdiff_t m_callsInFlight = 0;
   bool m_open = false;
   bool m_reading = false;
-  bool m_writing = false;
   bool m_closing = false;
   bool m_closeBegun = false;
 };
