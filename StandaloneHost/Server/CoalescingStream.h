@@ -64,8 +64,12 @@ public:
 
   [[nodiscard]] bool HasRoom() const { return m_state->HasRoom(); }
 
-  /// Calls `task` when there is room again.
-  void WhenRoom(std::function<void()> task) { m_state->whenRoom = std::move(task); }
+  /// Calls `task` once there is room again, or nothing can be sent any more.
+  void WhenRoom(std::function<void()> task)
+  {
+    m_state->whenRoom = std::move(task);
+    Flush();
+  }
 
   /// Gathers one text message as a WebSocket server frames it: final, unmasked, not compressed. The frame is whole, so
   /// it may stand between any two frames of the WebSocket's own (pong, close). Going through the WebSocket's own

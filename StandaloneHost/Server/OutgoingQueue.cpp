@@ -42,4 +42,12 @@ SharedMessage OutgoingQueue::Pop()
   return std::move(first.message);
 }
 
+void OutgoingQueue::Clear()
+{
+  m_waiting.clear();
+  m_bytes = 0;
+  m_changes = 0;
+  m_sequences = 0;
+}
+
 }

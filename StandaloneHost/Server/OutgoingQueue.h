@@ -33,6 +33,8 @@ public:
   /// The next message to send. The queue is not empty.
   [[nodiscard]] SharedMessage Pop();
 
+  void Clear();
+
   [[nodiscard]] bool Empty() const { return m_waiting.empty(); }
   [[nodiscard]] std::size_t Bytes() const { return m_bytes; }
 

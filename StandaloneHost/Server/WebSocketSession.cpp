@@ -60,6 +60,7 @@ public:
   void Abort() override
   {
     m_closing = true;
+    m_closeBegun = true;
     m_core->notifier.Forget(*this);
     error_code ignored;
     m_stream.next_layer().next_layer().close(ignored);
@@ -164,16 +165,16 @@ private:
   void Pump()
   {
     CoalescingStream& stream = m_stream.next_layer();
-    // Once the client has asked to close, nothing may follow the answer to that.
-    while (!m_queue.Empty() && stream.HasRoom() && m_stream.is_open() && !m_closeBegun)
+    if (m_closeBegun || !m_stream.is_open())
+    {
+      // One of the two has said goodbye; nothing may follow that.
+      m_queue.Clear();
+      return;
+    }
+    while (!m_queue.Empty() && stream.HasRoom())
       stream.GatherText(*m_queue.Pop());
     if (!m_queue.Empty())
-      stream.WhenRoom(
-          [weak = weak_from_this()]
-          {
-            if (const auto self = weak.lock())
-              self->Pump();
-          });
+      stream.WhenRoom([self = shared_from_this()] { self->Pump(); }); // what waits keeps the session
     else if (m_closing)
       BeginClose();
     else if (!m_reading)
