@@ -107,7 +107,7 @@ std::filesystem::path UserDataFolder()
 po::options_description Description()
 {
   po::options_description description("subject-store-host [options]");
-  const auto text = [](std::string fallback) { return po::value<std::string>()->default_value(std::move(fallback)); };
+  const auto text = [](const char* fallback) { return po::value<std::string>()->default_value(fallback); };
   const auto texts = [] { return po::value<std::vector<std::string>>()->composing(); };
   description.add_options()                                                                     //
       ("help", "show this text and exit")                                                       //

@@ -1,8 +1,8 @@
 // One call of a function with one text argument, from the request text to the reply: through the binding, and written
 // by hand for this one function.
 
-#include "RunaCorePluginSubjectStore/TerminalServer2/VServerFunction.h"
 #include "HostInterface/NotificationSystem/VAsioPostalServiceStrand.h"
+#include "RunaCorePluginSubjectStore/TerminalServer2/VServerFunction.h"
 
 #include <benchmark/benchmark.h>
 #include <boost/asio/io_context.hpp>

@@ -48,9 +48,9 @@ void OneNotification(benchmark::State& state)
   const auto postal = std::make_shared<InlinePostal>();
   const auto multiCallback = NMX::MakeShared<NotificationSystem::VMultiCallbackPostal<void(bool)>>();
   using Callback = TerminalServer2::VServerCallback<void(bool), NMX::IMultiCallbackPostal<void(bool)>>;
-  (void)registry.Add(2, NMX::MakeShared<Callback>(
-                            TerminalServer2::FunctionRecord{"Group.AbleChangedCallback", "", texts, ""}, multiCallback,
-                            postal));
+  (void)registry.Add(
+      2, NMX::MakeShared<Callback>(TerminalServer2::FunctionRecord{"Group.AbleChangedCallback", "", texts, ""},
+                                   multiCallback, postal));
   Notifier notifier(registry, limits);
   std::deque<Listener> listeners;
   for (int i = 0; i < state.range(0); ++i)

@@ -35,9 +35,9 @@ std::shared_ptr<Store::VStore> MakeStore(int count)
   return store;
 }
 
-/// The same names in the same random order for both, so that both miss the caches alike. Which one comes next depends on
-/// the answer to the one before: a caller waits for its answer, and without that the processor would overlap the bare
-/// lookups with each other, which no two calls ever are.
+/// The same names in the same random order for both, so that both miss the caches alike. Which one comes next depends
+/// on the answer to the one before: a caller waits for its answer, and without that the processor would overlap the
+/// bare lookups with each other, which no two calls ever are.
 const std::vector<std::string>& Questions()
 {
   static const std::vector<std::string> questions = []

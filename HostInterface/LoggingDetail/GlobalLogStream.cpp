@@ -7,19 +7,25 @@ namespace LoggingDetail
 
 std::string GlobalLogStream::Text() const noexcept
 {
-  if (!m_failed)
+  try
   {
-    try
+    if (!m_failed)
     {
       boost::format message{std::string(m_format)};
       for (const auto& argument : m_arguments)
         message % argument;
       return message.str();
     }
-    catch (...)
-    {
-    }
   }
+  catch (...)
+  {
+    return CannotFormat();
+  }
+  return CannotFormat();
+}
+
+std::string GlobalLogStream::CannotFormat() const noexcept
+{
   try
   {
     return "Cannot Format Log Message \"" + std::string(m_format) + '"';

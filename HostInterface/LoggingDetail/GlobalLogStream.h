@@ -40,6 +40,8 @@ public:
   [[nodiscard]] std::string Text() const noexcept;
 
 private:
+  [[nodiscard]] std::string CannotFormat() const noexcept;
+
   std::string_view m_format;
   std::vector<std::string> m_arguments;
   bool m_failed = false;

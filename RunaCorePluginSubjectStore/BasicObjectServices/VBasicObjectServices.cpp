@@ -12,7 +12,6 @@
 namespace BasicObjectServices
 {
 
-using NMX::EResult;
 using NMX::IResult;
 using NMX::TSubjectStoreId;
 using Subjects::IsBasicObject;

@@ -17,8 +17,8 @@ ServerFunctionBase::ServerFunctionBase(const FunctionRecord& record, std::shared
 {
 }
 
-void ServerFunctionBase::Accept(std::shared_ptr<VPendingReply> reply, IResult parsed, const ArgumentReader& reader,
-                                std::size_t argumentsRead)
+void ServerFunctionBase::Accept(const std::shared_ptr<VPendingReply>& reply, IResult parsed,
+                                const ArgumentReader& reader, std::size_t argumentsRead)
 {
   if (parsed.Failed())
   {

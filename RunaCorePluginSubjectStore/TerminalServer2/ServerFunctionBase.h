@@ -27,7 +27,7 @@ protected:
   ServerFunctionBase(const FunctionRecord& record, std::shared_ptr<NMX::IPostalService> postal);
 
   /// Finishes the reply at once when its arguments could not be read; otherwise runs the call where it belongs.
-  void Accept(std::shared_ptr<VPendingReply> reply, NMX::IResult parsed, const ArgumentReader& reader,
+  void Accept(const std::shared_ptr<VPendingReply>& reply, NMX::IResult parsed, const ArgumentReader& reader,
               std::size_t argumentsRead);
 
 private:

@@ -39,7 +39,7 @@ public:
     ArgumentReader reader(argumentText);
     std::size_t argumentsRead = 0;
     const NMX::IResult parsed = Parse(reader, call->values, argumentsRead, std::index_sequence_for<Args...>{});
-    Accept(std::move(call), parsed, reader, argumentsRead);
+    Accept(call, parsed, reader, argumentsRead);
   }
 
 private:

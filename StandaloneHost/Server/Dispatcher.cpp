@@ -121,7 +121,7 @@ struct Batch
   std::size_t calls;
   Answer answer;
 
-  void Take(std::string part)
+  void Take(const std::string& part)
   {
     if (!part.empty())
     {
@@ -196,7 +196,7 @@ std::size_t Dispatcher::Handle(std::string_view text, IListener* listener, Answe
   batch->calls = calls;
   batch->answer = std::move(answer);
   for (const Request& request : message.requests)
-    HandleRequest(request, listener, [batch](std::string part, std::size_t) { batch->Take(std::move(part)); });
+    HandleRequest(request, listener, [batch](const std::string& part, std::size_t) { batch->Take(part); });
   return calls;
 }
 

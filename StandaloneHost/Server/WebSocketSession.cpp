@@ -22,6 +22,7 @@ namespace
 
 constexpr auto handshakeTime = std::chrono::seconds(10);
 constexpr auto closingTime = std::chrono::seconds(2);
+constexpr std::size_t keptBuffer = std::size_t{64} << 10; // for the next message; what a long one took is given back
 
 /// One WebSocket client: reads its messages, and queues what is for it. Beast reads, and writes what the protocol asks
 /// for by itself (handshake, pong, close); messages go straight into the stream beneath it.
@@ -115,6 +116,8 @@ private:
       Close(websocket::close_code::unknown_data, "text frames only");
     // Until here the message lies in the buffer, so nothing is read into it, even when the answer is given at once.
     m_buffer.clear();
+    if (m_buffer.capacity() > keptBuffer)
+      m_buffer.shrink_to_fit();
     m_reading = false;
     Read();
     if (!m_reading)

@@ -78,6 +78,7 @@ IResult VStore::Commit(ChangeSet&& changes, std::unique_lock<std::mutex> edit)
   for (const auto& [id, change] : changes.subjects)
     kinds |= 1U << static_cast<unsigned>(change.kind);
   std::vector<NMX::EntryPath> paths;
+  paths.reserve(changes.applicationEntries.size());
   for (const auto& [path, value] : changes.applicationEntries)
     paths.push_back(path);
   {

@@ -144,8 +144,7 @@ private:
         if (m_totals.measuring)
         {
           ++m_totals.calls;
-          m_totals.latencies.push_back(
-              std::chrono::duration<float, std::micro>(now - m_sent[m_oldest]).count());
+          m_totals.latencies.push_back(std::chrono::duration<float, std::micro>(now - m_sent[m_oldest]).count());
         }
         m_sent[m_oldest] = now;
         m_oldest = (m_oldest + 1) % m_sent.size();
@@ -191,8 +190,7 @@ int main(int argumentCount, char** arguments)
     std::vector<std::unique_ptr<Connection>> connections;
     for (std::size_t i = 0; i < values["connections"].as<std::size_t>(); ++i)
     {
-      connections.push_back(
-          std::make_unique<Connection>(context, Frame(values["request"].as<std::string>()), totals));
+      connections.push_back(std::make_unique<Connection>(context, Frame(values["request"].as<std::string>()), totals));
       connections.back()->Open(endpoint, values["path"].as<std::string>());
     }
     for (auto& connection : connections)
