@@ -88,7 +88,7 @@ TEST(PluginModule, AHostWithoutServerOrSettingsIsNoReasonToFail)
   EXPECT_TRUE(plugin->RegisterServices(noServer));
 }
 
-TEST(PluginModule, FilesThatAreNoPluginAreRefusedByName)
+TEST(PluginModule, FilesThatCannotBeUsedAreRefusedByName)
 {
   const TemporaryFolder folder;
   const auto textFile = folder.Path() / "text.so";
@@ -107,5 +107,7 @@ TEST(PluginModule, FilesThatAreNoPluginAreRefusedByName)
   };
   EXPECT_THAT(message(folder.Path() / "missing.so"), testing::HasSubstr("missing.so"));
   EXPECT_THAT(message(textFile), testing::HasSubstr("text.so"));
+  EXPECT_THAT(message(SUBJECT_STORE_OTHER_PLUGIN_FILE),
+              testing::HasSubstr("its build revision is 155049, this host needs 155050"));
   EXPECT_THAT(message("libsqlite3.so.0"), testing::HasSubstr("it has no function PluginBuildRevision"));
 }
