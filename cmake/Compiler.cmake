@@ -20,7 +20,9 @@ endif()
 
 find_program(CCACHE ccache)
 if(CCACHE)
-  set(CMAKE_CXX_COMPILER_LAUNCHER ${CCACHE})
+  # Paths are made relative to the tree, so that another clone of it finds what this one has compiled.
+  set(CMAKE_CXX_COMPILER_LAUNCHER ${CMAKE_COMMAND} -E env CCACHE_BASEDIR=${PROJECT_SOURCE_DIR} CCACHE_NOHASHDIR=1
+                                  ${CCACHE})
 endif()
 
 find_program(MOLD mold)
