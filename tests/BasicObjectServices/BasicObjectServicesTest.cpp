@@ -12,9 +12,7 @@
 using NMX::EResult;
 using NMX::IResult;
 using testing::_;
-using testing::AllOf;
 using testing::ElementsAre;
-using testing::Ge;
 using testing::NiceMock;
 using testing::Pair;
 using testing::Return;

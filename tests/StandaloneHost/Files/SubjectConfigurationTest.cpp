@@ -275,7 +275,7 @@ TEST_F(SubjectConfigurationTest, RefusesMalformedFilesAndTellsWhere)
       {" \n ", "2:2: the file ends too early", "expected an element"},
       {"stage", "1:1: not well-formed XML"},
       {"<SubjectConfiguration version='1'>\n<Subjects><Subject \xFF", "2:20: this is not a UTF-8 character", "UTF-8"},
-      {"\xFF\xFE<\0a\0", "1:1: this is not a UTF-8 character"},
+      {"\xFF\xFE<", "1:1: this is not a UTF-8 character"},
       {"<SubjectConfiguration version='1'>\n<Subjects" + attributes + "/></SubjectConfiguration>",
        "2:1: a tag of more than 65536 bytes"},
       {"<?xml version='1.0' encoding='ISO-8859-1'?>" + File(""), "1:1: the declared encoding is \"ISO-8859-1\"",
