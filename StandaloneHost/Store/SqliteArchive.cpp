@@ -271,13 +271,23 @@ IResult SqliteArchive::Keep(const ChangeSet& changes)
   {
     NMX::Log(NMX::systemLog, NMX::ESeverity::Error, "The store \"%1%\" cannot keep a change: %2%", m_file,
              sqlite3_errmsg(m_database.get()));
-    if (sqlite3_get_autocommit(m_database.get()) == 0)
-    {
-      (void)sqlite3_step(m_rollback.get());
-      sqlite3_reset(m_rollback.get());
-    }
+    RollBack();
     return failure.code == SQLITE_FULL ? EResult::DiskFull : EResult::FileIOFailure;
   }
+  catch (...)
+  {
+    // A transaction that stayed open would refuse every later one.
+    RollBack();
+    throw;
+  }
+}
+
+void SqliteArchive::RollBack() noexcept
+{
+  if (sqlite3_get_autocommit(m_database.get()) != 0)
+    return;
+  (void)sqlite3_step(m_rollback.get());
+  sqlite3_reset(m_rollback.get());
 }
 
 }

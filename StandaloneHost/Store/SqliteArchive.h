@@ -44,6 +44,7 @@ private:
   void PrepareSchema();
   [[nodiscard]] int UserVersion();
   void Step(sqlite3_stmt* statement);
+  void RollBack() noexcept;
   [[noreturn]] void Fail(const std::string& what) const;
 
   std::string m_file;
