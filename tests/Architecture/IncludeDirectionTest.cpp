@@ -35,12 +35,13 @@ const std::map<std::string, std::set<std::string>> allowed{
       "RunaCorePluginSubjectStore/BasicObjectServices", "HostInterface", "StoreInterface"}},
 
     {"StandaloneHost/Store", {"HostInterface", "StoreInterface"}},
+    {"StandaloneHost/Evaluation", {"HostInterface", "StoreInterface"}},
     {"StandaloneHost/Postal", {"HostInterface"}},
     {"StandaloneHost/Server", {"HostInterface"}},
     {"StandaloneHost/Files", {"StandaloneHost/Store", "HostInterface", "StoreInterface"}},
     {"StandaloneHost",
-     {"StandaloneHost/Store", "StandaloneHost/Postal", "StandaloneHost/Server", "StandaloneHost/Files", "HostInterface",
-      "StoreInterface"}},
+     {"StandaloneHost/Store", "StandaloneHost/Postal", "StandaloneHost/Server", "StandaloneHost/Files",
+      "StandaloneHost/Evaluation", "HostInterface", "StoreInterface"}},
 };
 
 /// The folder of `allowed` that a file belongs to: the deepest that its path begins with.
