@@ -1,6 +1,7 @@
 #include "StandaloneHost/Application.h"
 
 #include "HostInterface/NMX/GlobalLog.h"
+#include "StandaloneHost/Evaluation/VObjectEvaluationEngine.h"
 #include "StandaloneHost/Files/SubjectConfiguration.h"
 #include "StandaloneHost/PluginModule.h"
 #include "StandaloneHost/Postal/VAsioPostalService.h"
@@ -72,12 +73,23 @@ void WaitForSignal()
   sigwait(&signals, &received);
 }
 
+/// Object evaluation, if the feature is switched on.
+std::shared_ptr<Evaluation::VObjectEvaluationEngine> StartEvaluation(const std::shared_ptr<Store::VStore>& store,
+                                                                     const Options& options)
+{
+  if ((options.features & RunaCorePluginInterface::Feature::objectEvaluation) == 0)
+    return nullptr;
+  return NMX::MakeShared<Evaluation::VObjectEvaluationEngine>(store);
+}
+
 /// The order matters: clients go first, then what serves them, then the plugin, and the store last.
-void Stop(Server::VServer& server, Postal::VAsioPostalService& postal, PluginPointer plugin,
-          std::shared_ptr<Store::VStore> store)
+void Stop(Server::VServer& server, Postal::VAsioPostalService& postal, Evaluation::VObjectEvaluationEngine* evaluation,
+          PluginPointer plugin, std::shared_ptr<Store::VStore> store)
 {
   server.Close(); // no client, no outstanding call, no function any more
   postal.Stop();  // the strands have run empty
+  if (evaluation != nullptr)
+    evaluation->Stop(); // nobody edits the store any more
   plugin->UnregisterQml();
   plugin.reset();
   store.reset();
@@ -93,9 +105,11 @@ void RunApplication(const Options& options)
 
   const auto postal = NMX::MakeShared<Postal::VAsioPostalService>();
   const auto server = NMX::MakeShared<Server::VServer>(postal, options.server);
+  const auto evaluation = StartEvaluation(store, options);
   try
   {
-    VPluginHost host({store, postal, server, std::make_shared<VPluginSettings>(options.features)});
+    const auto settings = std::make_shared<VPluginSettings>(options.features, HostSettings{evaluation});
+    VPluginHost host({store, postal, server, settings});
     (void)plugin->RegisterServices(host);
     plugin->RegistrationFinished();
     server->Open();
@@ -106,8 +120,8 @@ void RunApplication(const Options& options)
   }
   catch (...)
   {
-    Stop(*server, *postal, std::move(plugin), std::move(store));
+    Stop(*server, *postal, evaluation.get(), std::move(plugin), std::move(store));
     throw;
   }
-  Stop(*server, *postal, std::move(plugin), std::move(store));
+  Stop(*server, *postal, evaluation.get(), std::move(plugin), std::move(store));
 }

@@ -101,7 +101,10 @@ void VPluginHost::AccessRights(std::shared_ptr<IAccessRights>& rights) const
   rights.reset();
 }
 
-VPluginSettings::VPluginSettings(std::uint32_t featureMask) : m_features(std::make_shared<VFeatures>(featureMask)) {}
+VPluginSettings::VPluginSettings(std::uint32_t featureMask, HostSettings settings)
+    : m_features(std::make_shared<VFeatures>(featureMask)), m_settings(std::move(settings))
+{
+}
 
 void VPluginSettings::Features(std::shared_ptr<IFeatures>& features) const
 {
@@ -120,7 +123,7 @@ void VPluginSettings::RigidObjectControls(std::shared_ptr<IRigidObjectControls>&
 
 void VPluginSettings::ObjectEvaluationSettings(std::shared_ptr<IObjectEvaluationSettings>& settings) const
 {
-  settings.reset();
+  settings = m_settings.objectEvaluation;
 }
 
 void VPluginSettings::CharacterSettings(std::shared_ptr<ICharacterSettings>& settings) const

@@ -42,11 +42,17 @@ private:
   const HostServices m_services;
 };
 
+/// What the services are configured with, where the host has it.
+struct HostSettings
+{
+  std::shared_ptr<RunaCorePluginInterface::IObjectEvaluationSettings> objectEvaluation;
+};
+
 /// The host's settings object: the feature mask of the command line, and what the services are configured with.
 class VPluginSettings final : public RunaCorePluginInterface::IPluginSettings
 {
 public:
-  explicit VPluginSettings(std::uint32_t featureMask);
+  explicit VPluginSettings(std::uint32_t featureMask, HostSettings settings = {});
 
   void Features(std::shared_ptr<RunaCorePluginInterface::IFeatures>& features) const override;
   void SmartObjectControls(std::shared_ptr<ISmartObjectControls>& controls) const override;
@@ -58,4 +64,5 @@ public:
 
 private:
   const std::shared_ptr<RunaCorePluginInterface::IFeatures> m_features;
+  const HostSettings m_settings;
 };

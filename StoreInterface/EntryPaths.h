@@ -61,6 +61,11 @@ template <PathText path>
 {
   return PathConstant<"Parameters/ColourRGBA">();
 }
+/// How many of its markers an object is recognised by; 0 for the default.
+[[nodiscard]] inline EntryPath EntranceThreshold()
+{
+  return PathConstant<"Parameters/EntranceThreshold">();
+}
 [[nodiscard]] inline EntryPath FilePath()
 {
   return PathConstant<"Parameters/FilePath">();
@@ -164,6 +169,14 @@ template <PathText path>
 [[nodiscard]] inline EntryPath WarningCFCChildWarning()
 {
   return PathConstant<"Warnings/WarningCFCChildWarning">();
+}
+[[nodiscard]] inline EntryPath WarningObjectConfusion()
+{
+  return PathConstant<"Warnings/WarningObjectConfusion">();
+}
+[[nodiscard]] inline EntryPath WarningObjectConfusionCritical()
+{
+  return PathConstant<"Warnings/WarningObjectConfusionCritical">();
 }
 /// The markers of a basic object, in mm in the object's own frame.
 [[nodiscard]] inline EntryPath Markers()

@@ -6,6 +6,7 @@
 #include "HostInterface/RunaCorePluginInterface/IPluginSettings.h"
 #include "HostInterface/TerminalServer2/IServer.h"
 #include "RunaCorePluginSubjectStore/Catalogue/BasicObjectCatalogue.h"
+#include "RunaCorePluginSubjectStore/Catalogue/ObjectEvaluationCatalogue.h"
 
 #include <utility>
 
@@ -14,13 +15,18 @@ using namespace RunaCorePluginInterface;
 namespace
 {
 
-/// The feature mask as it is now. The host may change it at any time, so nobody keeps it.
-std::uint32_t FeatureMask(const IPluginHost& host)
+std::shared_ptr<IPluginSettings> Settings(const IPluginHost& host)
 {
   std::shared_ptr<IPluginSettings> settings;
   host.Settings(settings);
+  return settings;
+}
+
+/// The feature mask as it is now. The host may change it at any time, so nobody keeps it.
+std::uint32_t FeatureMask(const IPluginHost& host)
+{
   std::shared_ptr<IFeatures> features;
-  if (settings)
+  if (const auto settings = Settings(host))
     settings->Features(features);
   return features ? features->Mask() : 0;
 }
@@ -64,6 +70,14 @@ bool VRunaCorePluginSubjectStore::RegisterServices(IPluginHost& host)
     auto service = NMX::MakeShared<BasicObjectServices::VBasicObjectServices>(Store(host));
     Publish<NMX::IBasicObjectServices>(host, Catalogue::BasicObjectGroup(), service);
     m_basicObjectServices = std::move(service);
+  }
+  if ((FeatureMask(host) & Feature::objectEvaluation) != 0)
+  {
+    std::shared_ptr<IObjectEvaluationSettings> evaluation;
+    Settings(host)->ObjectEvaluationSettings(evaluation);
+    auto service = ObjectEvaluationServices::VObjectEvaluationServices::Make(Store(host), std::move(evaluation));
+    Publish<NMX::IObjectEvaluationServices>(host, Catalogue::ObjectEvaluationGroup(), service);
+    m_objectEvaluationServices = std::move(service);
   }
   return true;
 }

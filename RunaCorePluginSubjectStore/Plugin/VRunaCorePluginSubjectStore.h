@@ -2,6 +2,7 @@
 
 #include "HostInterface/RunaCorePluginInterface/IPlugin.h"
 #include "RunaCorePluginSubjectStore/BasicObjectServices/VBasicObjectServices.h"
+#include "RunaCorePluginSubjectStore/ObjectEvaluationServices/VObjectEvaluationServices.h"
 
 #include <memory>
 
@@ -19,4 +20,5 @@ public:
 
 private:
   std::shared_ptr<BasicObjectServices::VBasicObjectServices> m_basicObjectServices;
+  std::shared_ptr<ObjectEvaluationServices::VObjectEvaluationServices> m_objectEvaluationServices;
 };

@@ -15,6 +15,9 @@ inline constexpr double sameSpot = 1.0;
 /// An object with more markers than this is not compared with others.
 inline constexpr std::size_t maximumMarkers = 64;
 
+/// Nor one with a marker further (mm) than this from its origin on any axis.
+inline constexpr double largestCoordinate = 1e6;
+
 /// A set of markers of one object, one bit for each.
 using Mask = std::uint64_t;
 

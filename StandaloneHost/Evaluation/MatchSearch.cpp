@@ -13,7 +13,7 @@ namespace Evaluation
 namespace
 {
 
-constexpr std::uint64_t stepsBetweenQuestions = 16;
+constexpr std::uint64_t stepsBetweenQuestions = 64;
 
 /// Displacements (mm) that are nothing but rounding: no match is closer.
 constexpr double exact = 1e-6;

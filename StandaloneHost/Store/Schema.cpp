@@ -102,6 +102,7 @@ std::vector<Row> Rows()
       {basic | smart, Paths::AutoAssignedName(), EValueType::Text, {}},
       {basic | smart, Paths::AutoAssignEnabled(), EValueType::Bool, false},
       {basic | smart | cluster, Paths::ColourRGBA(), EValueType::Colour, NMX::Colour{}},
+      {basic | smart, Paths::EntranceThreshold(), EValueType::UInt32, 0U},
       {basic | general | cluster | mesh, Paths::FilePath(), EValueType::WideText, {}},
       {basic | smart | cluster, Paths::PresetName(), EValueType::Text, std::string{}},
       {basic | smart, Paths::ProximityGroupName(), EValueType::Text, std::string{}},

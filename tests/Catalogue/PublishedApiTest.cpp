@@ -1,7 +1,9 @@
 #include "RunaCorePluginSubjectStore/BasicObjectServices/BasicObjectWarnings.h"
 #include "RunaCorePluginSubjectStore/BasicObjectServices/VBasicObjectServices.h"
 #include "RunaCorePluginSubjectStore/Catalogue/BasicObjectCatalogue.h"
+#include "RunaCorePluginSubjectStore/Catalogue/ObjectEvaluationCatalogue.h"
 #include "RunaCorePluginSubjectStore/CharacterFromClustersServices/CharacterWarnings.h"
+#include "RunaCorePluginSubjectStore/ObjectEvaluationServices/VObjectEvaluationServices.h"
 #include "RunaCorePluginSubjectStore/SmartObjectServices/SmartObjectWarnings.h"
 #include "RunaCorePluginSubjectStore/Subjects/Warnings.h"
 #include "StandaloneHost/Store/VStore.h"
@@ -73,6 +75,14 @@ void RegisterBasicObjects(RecordingServer& server, std::uint32_t mask)
                                            std::make_shared<ManualPostal>(), mask);
 }
 
+void RegisterObjectEvaluation(RecordingServer& server, std::uint32_t mask)
+{
+  const auto service =
+      ObjectEvaluationServices::VObjectEvaluationServices::Make(NMX::MakeShared<Store::VStore>(), nullptr);
+  RegisterGroup<NMX::IObjectEvaluationServices>(server, Catalogue::ObjectEvaluationGroup(), service,
+                                                std::make_shared<ManualPostal>(), mask);
+}
+
 std::string Name(EArgumentType type, const TypeRecord* enumeration)
 {
   const auto enumerationName = [&] { return std::string(enumeration->name.substr(enumeration->name.find('.') + 1)); };
@@ -129,36 +139,35 @@ json::object Describe(const TypeRecord& record)
 
 TEST(PublishedApi, GroupsAreRegisteredAsPromisedInTheirOrder)
 {
-  RecordingServer server;
-  RegisterBasicObjects(server, 0xFFFFFFFF);
-
-  std::vector<std::string> order;
-  json::array promisedFunctions;
+  const std::map<std::string, void (*)(RecordingServer&, std::uint32_t)> groups{
+      {"BasicObjectServices", RegisterBasicObjects}, {"ObjectEvaluationServices", RegisterObjectEvaluation}};
+  EXPECT_EQ(Promised().at("groups").as_array().size(), groups.size());
   for (const json::value& group : Promised().at("groups").as_array())
   {
-    order.emplace_back(group.at("name").as_string());
-    EXPECT_EQ(server.types.at(0).name, group.at("name").as_string());
-    EXPECT_EQ(server.types.at(0).description, group.at("description").as_string());
-    EXPECT_TRUE(server.types.at(0).values.empty());
+    const std::string name(group.at("name").as_string());
+    ASSERT_TRUE(groups.contains(name)) << name;
+    RecordingServer server;
+    groups.at(name)(server, 0xFFFFFFFF);
+
+    std::vector<std::string> order{name};
     for (const json::value& type : Promised().at("enumerations").as_array())
-      if (type.at("name").as_string().starts_with(std::string(group.at("name").as_string()) + '.'))
+      if (type.at("name").as_string().starts_with(name + '.'))
         order.emplace_back(type.at("name").as_string());
     for (const json::value& function : group.at("functions").as_array())
-    {
       order.emplace_back(function.at("name").as_string());
-      promisedFunctions.push_back(function);
-    }
-  }
-  EXPECT_EQ(server.order, order);
+    EXPECT_EQ(server.order, order);
+    EXPECT_EQ(server.types.at(0).description, group.at("description").as_string());
+    EXPECT_TRUE(server.types.at(0).values.empty());
 
-  json::array registered;
-  for (const auto& function : server.functions)
-    registered.emplace_back(Describe(function->Record(), function->Arguments()));
-  for (const auto& callback : server.callbacks)
-    registered.emplace_back(Describe(callback->Record(), callback->Arguments()));
-  ASSERT_EQ(registered.size(), promisedFunctions.size());
-  for (std::size_t i = 0; i < registered.size(); ++i)
-    EXPECT_EQ(registered[i], promisedFunctions[i]);
+    json::array registered;
+    for (const auto& function : server.functions)
+      registered.emplace_back(Describe(function->Record(), function->Arguments()));
+    for (const auto& callback : server.callbacks)
+      registered.emplace_back(Describe(callback->Record(), callback->Arguments()));
+    ASSERT_EQ(registered.size(), group.at("functions").as_array().size());
+    for (std::size_t i = 0; i < registered.size(); ++i)
+      EXPECT_EQ(registered[i], group.at("functions").as_array()[i]);
+  }
 }
 
 TEST(PublishedApi, EnumerationsAreAsPromisedAndEachWarningHasItsEntry)
@@ -214,6 +223,18 @@ TEST(PublishedApi, FeatureBitsLowerTheLevelOfTheirFunctionsAndOfNoOthers)
           (autoAssign.contains(name) && (mask & 0x8000) == 0) || (grouping.contains(name) && (mask & 0x100) == 0);
       EXPECT_EQ(level, lowered ? 1U : 2U) << full << " under " << mask;
     }
+  }
+}
+
+TEST(PublishedApi, EverythingOfObjectEvaluationHasTheLevelOfItsFeature)
+{
+  for (const std::uint32_t mask : {0x200U, 0xFFFFFDFFU})
+  {
+    RecordingServer server;
+    RegisterObjectEvaluation(server, mask);
+    EXPECT_EQ(server.levels.size(), 11U);
+    for (const auto& [name, level] : server.levels)
+      EXPECT_EQ(level, mask == 0x200 ? 2U : 1U) << name;
   }
 }
 

@@ -56,7 +56,7 @@ TEST(PluginModule, ExportsThreeFunctionsThatWorkWithoutAPluginObject)
 TEST(PluginModule, RegistersTheGroupsThatTheMaskAllowsAndSurvivesItsDestruction)
 {
   const auto postal = NMX::MakeShared<Postal::VAsioPostalService>();
-  for (const std::uint32_t mask : {0U, 1U})
+  for (const auto& [mask, count] : {std::pair(0U, 0), std::pair(1U, 20), std::pair(0x200U, 11), std::pair(0x201U, 31)})
   {
     auto plugin = LoadPlugin(SUBJECT_STORE_PLUGIN_FILE);
     EXPECT_STREQ(plugin->PluginName(), "");
@@ -64,16 +64,18 @@ TEST(PluginModule, RegistersTheGroupsThatTheMaskAllowsAndSurvivesItsDestruction)
     const auto server = std::make_shared<CountingServer>();
     VPluginHost host({NMX::MakeShared<Store::VStore>(), postal, server, std::make_shared<VPluginSettings>(mask)});
     EXPECT_TRUE(plugin->RegisterServices(host));
-    EXPECT_EQ(server->count, mask == 0 ? 0 : 20);
+    EXPECT_EQ(server->count, count);
 
     // A host that still holds a function after the plugin has gone can call it: the function holds its service.
     plugin.reset();
     if (server->kept)
     {
-      std::string_view text = "[\"Nobody\"]";
+      std::string_view text = mask == 1 ? "[\"Nobody\"]" : "[\"Nobody\", \"Crate\"]";
       std::promise<NMX::IResult> result;
       server->kept->Invoke(text, [&](const NMX::IServerReply& reply) { result.set_value(reply.Result()); });
-      EXPECT_EQ(result.get_future().get(), NMX::IResult(NMX::EResult::NotFound));
+      // This host has no object evaluation.
+      EXPECT_EQ(result.get_future().get(),
+                NMX::IResult(mask == 1 ? NMX::EResult::NotFound : NMX::EResult::NotSupported));
     }
   }
   postal->Stop();
