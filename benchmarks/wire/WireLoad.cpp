@@ -215,9 +215,9 @@ int main(int argumentCount, char** arguments)
     };
     const auto calls = static_cast<double>(totals.calls);
     std::printf("{\"callsPerSecond\": %.0f, \"processorMicrosecondsPerCall\": %.2f, \"latencyMicroseconds\": "
-                "{\"p50\": %.0f, \"p99\": %.0f}}\n",
+                "{\"p50\": %.0f, \"p99\": %.0f, \"max\": %.0f}}\n",
                 calls / elapsed, processor / calls * 1e6, static_cast<double>(quantile(0.5)),
-                static_cast<double>(quantile(0.99)));
+                static_cast<double>(quantile(0.99)), static_cast<double>(quantile(1)));
     return totals.calls > 0 ? 0 : 1;
   }
   catch (const std::exception& failure)

@@ -10,6 +10,11 @@ const records = published.groups.flatMap(group => group.functions);
 export const callbacks = records.filter(record => record.name.endsWith('Callback'));
 export const functions = records.filter(record => !record.name.endsWith('Callback'));
 
+// Those of the functions or callbacks that are in the group.
+export function inGroup(group, list) {
+  return list.filter(({ name }) => name.startsWith(`${group}.`));
+}
+
 const failureNames = [
   'Failed', 'FailedWithException', 'Finished', 'Stopping', 'NotImplemented', 'NotSupported', 'NotPermitted',
   'NotAvailable', 'NotConnected', 'NotSet', 'NotFound', 'NotRequired', 'AlreadyPresent', 'AlreadyInProgress',
@@ -27,6 +32,7 @@ export const codes = {
 };
 
 export const changed = 'BasicObjectServices.BasicObjectChangedCallback';
+export const evaluationChanged = 'ObjectEvaluationServices.EvaluationChangedCallback';
 
 export function inputs(record) {
   return record.arguments.filter(argument => argument.direction === 'input');
@@ -65,7 +71,8 @@ export function assertFails(answer, method, name) {
 // Everything that the API tells about the basic objects: for each, the answers to all queries by name.
 export async function snapshot(connection) {
   const list = await connection.call('BasicObjectServices.BasicObjectList');
-  const queries = functions.filter(record => inputs(record).length === 1 && outputs(record).length === 1);
+  const queries = inGroup('BasicObjectServices', functions)
+    .filter(record => inputs(record).length === 1 && outputs(record).length === 1);
   const objects = {};
   for (const name of list.result.outputs.Names) {
     const answers = await Promise.all(queries.map(query => connection.call(query.name, [name])));

@@ -12,6 +12,14 @@ import { post, request } from './wire.mjs';
 const own = ['Server.Subscribe', 'Server.Unsubscribe', 'rpc.discover'];
 const groupOf = name => name.split('.')[0];
 
+// Each: its name in a schema, and its least and greatest value where it has them.
+const simpleTypes = {
+  'text': ['string'],
+  'bool': ['boolean'],
+  'double': ['number'],
+  'unsigned 64-bit': ['integer', 0, 2 ** 64],
+};
+
 // Checks what matters of the schema of a published type.
 function assertSchema(schema, type) {
   const [, enumeration] = /^map (\w+) to text$/.exec(type) ?? [];
@@ -24,7 +32,8 @@ function assertSchema(schema, type) {
   } else if (type === 'set of texts') {
     assert.deepEqual([schema.type, schema.uniqueItems, schema.items.type], ['array', true, 'string']);
   } else {
-    assert.equal(schema.type, { text: 'string', bool: 'boolean' }[type]);
+    const [name, minimum, maximum] = simpleTypes[type];
+    assert.deepEqual([schema.type, schema.minimum, schema.maximum], [name, minimum, maximum]);
   }
 }
 
@@ -50,6 +59,8 @@ describe('The description', () => {
     const page = await request(host, { method: 'GET', path: '/openrpc.json' });
     assert.equal(page.status, 200);
     assert.deepEqual(JSON.parse(page.body), document);
+    // A double does not hold it, nor does JSON.parse.
+    assert.match(page.body, /"maximum":18446744073709551615[,}]/);
   });
 
   test('is a valid OpenRPC document', () => {

@@ -65,13 +65,22 @@ function group(name, entries) {
   return content && `<${name}>${content}</${name}>`;
 }
 
+// Where in a subject its markers stand.
+function markersOf(kind, markers) {
+  const positions = markers.map(([x, y, z]) => `<Marker x="${x}" y="${y}" z="${z}"/>`).join('');
+  if (positions === '')
+    return '';
+  return kind === 'SmartObjects'
+    ? `<SmartObject><AdditionalMarkerPositions>${positions}</AdditionalMarkerPositions></SmartObject>`
+    : `<Markers>${positions}</Markers>`;
+}
+
 // The text of a subject configuration. A subject: { kind, name, parameters, warnings, markers }; the name is enough.
 export function configuration(subjects) {
   const lines = subjects.map(({ kind = 'BasicObjects', name, parameters = {}, warnings = [], markers = [] }) => {
-    const positions = markers.map(([x, y, z]) => `<Marker x="${x}" y="${y}" z="${z}"/>`).join('');
     const content = group('Parameters', Object.entries(parameters)) +
                     group('Warnings', warnings.map(warning => [`Warning${warning}`, true])) +
-                    (positions && `<Markers>${positions}</Markers>`);
+                    markersOf(kind, markers);
     return `    <Subject kind="${kind}" name="${escaped(name)}">${content}</Subject>`;
   });
   return ['<SubjectConfiguration version="1">', '  <Subjects>', ...lines, '  </Subjects>', '</SubjectConfiguration>',
@@ -128,6 +137,10 @@ class Host {
 
   get stderr() {
     return this.#process.stderr;
+  }
+
+  get pid() {
+    return this.#process.child.pid;
   }
 
   // Asks the host to end, and answers its exit status.
