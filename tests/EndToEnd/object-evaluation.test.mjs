@@ -229,7 +229,7 @@ test('Warnings come and go with their causes', () => withStage([
   // The counts are those of the object that is back; any other edit has them begin at 0 at once, and stay there.
   const pair = ['Crate', 'Barrel'];
   for (const [name, ...params] of [['Rename', 'Crate', 'Box'], ['SetColor', 'Lamp', '#112233'],
-                                   ['Rename', 'Box', 'Crate'], ['SetEnabled', 'Lamp', false]]) {
+                                   ['Rename', 'Box', 'Crate']]) {
     connection.notifications.splice(0);
     await edit(connection, 'SetEnabled', 'Barrel', false);
     await eventually(() => warnings(connection, pair), [[], []]);
@@ -239,17 +239,16 @@ test('Warnings come and go with their causes', () => withStage([
     await finished(connection, 5);
     assert.deepEqual(await warnings(connection, pair), [[6], [6]]);
 
+    connection.notifications.splice(0);
     const [, counts] = await atOnce(() => edit(connection, name, ...params), () => progress(connection));
     assert.deepEqual(counts, [0, 0], name);
     if (name === 'Rename')
       pair[0] = params[1];
     await eventually(async () => (await distance(connection, ...pair) ?? greatest) < 1e-6, true);
-    await sleep(scaled(50));
+    await told(connection, evaluationChanged);
     assert.deepEqual(await progress(connection), [0, 0], name);
     assert.deepEqual(await warnings(connection, pair), [[6], [6]], name);
   }
-  await edit(connection, 'SetEnabled', 'Lamp', true);
-  await finished(connection, 5);
 
   // Off and on again sooner than anyone could look.
   const [, cleared] = await atOnce(() => ask(connection, 'SetEnabled', false), () => warnings(connection, all),
@@ -264,23 +263,22 @@ test('Warnings come and go with their causes', () => withStage([
 
 test('The threshold tells what is warned of, and how', () => withStage([
   { name: 'Flat', markers: flat }, { name: 'Bent', markers: bent }], async connection => {
-  const names = ['Flat', 'Bent'];
+  const found = () => warnings(connection, ['Flat', 'Bent']);
   await ask(connection, 'SetEnabled', true);
-  await connection.call('Server.Subscribe', [evaluationChanged]);
   for (const [threshold, expected] of [[8, [6]], [5, [5]], [2, []], [5, [5]], [4, [5]], [0, []], [60, [6]]]) {
     await ask(connection, 'SetWarningThreshold', threshold);
-    // A client need not ask before it is told. Once all is done, the warnings are in line with the threshold.
-    do
-      await told(connection, evaluationChanged);
-    while (!isDeepStrictEqual(await progress(connection), [4, 4]));
-    assert.deepEqual(await warnings(connection, names), [expected, expected], threshold);
+    // An update is not done before its warnings are there.
+    await finished(connection, 4);
+    assert.deepEqual(await found(), [expected, expected], threshold);
   }
-  const [, ...after] = await atOnce(() => ask(connection, 'SetEnabled', false), () => warnings(connection, names),
-                                    () => connection.call(`${group}.Progress`));
-  assert.deepEqual(after[0], [[], []]);
-  assertFails(after[1], `${group}.Progress`, 'NotAvailable');
+  assert.ok(await distance(connection, 'Flat', 'Flat') > 10, 'with a greater threshold, matches are more distant');
+
+  const [, cleared, off] = await atOnce(() => ask(connection, 'SetEnabled', false), found,
+                                        () => connection.call(`${group}.Progress`));
+  assert.deepEqual(cleared, [[], []]);
+  assertFails(off, `${group}.Progress`, 'NotAvailable');
   await sleep(scaled(50));
-  assert.deepEqual(await warnings(connection, names), [[], []]);
+  assert.deepEqual(await found(), [[], []]);
 }));
 
 test('Settings and warnings outlive the host, however it ends', async () => {
@@ -288,9 +286,8 @@ test('Settings and warnings outlive the host, however it ends', async () => {
   const run = (body, subjects) => withStage(subjects, body, { data });
   const names = ['Crate', 'Barrel'];
   const assertSettings = async (connection, enabled) => {
-    assert.deepEqual(await ask(connection, 'Enabled'), [enabled]);
-    assert.deepEqual(await ask(connection, 'MaximumEvaluationStepCount'), [777]);
-    assert.deepEqual(await ask(connection, 'WarningThreshold'), [6.25]);
+    const settings = ['Enabled', 'MaximumEvaluationStepCount', 'WarningThreshold'];
+    assert.deepEqual(await Promise.all(settings.map(name => ask(connection, name))), [[enabled], [777], [6.25]]);
   };
   await run(async (connection, host) => {
     await ask(connection, 'SetMaximumEvaluationStepCount', 777);
@@ -352,7 +349,8 @@ test('Nothing waits for a comparison that does not end', () => {
   let seed = 1;
   const next = () => (seed = seed * 48271 % 2147483647) / 2147483647 * 60;
   const crowd = Array.from({ length: 40 }, (_, i) => (
-    { name: `Object ${i}`, markers: Array.from({ length: 40 }, () => [next(), next(), next()]) }));
+    { name: `Object ${i}`, parameters: { EntranceThreshold: 30 },
+      markers: Array.from({ length: 40 }, () => [next(), next(), next()]) }));
   return withStage(crowd, async (connection, host) => {
     const prompt = promise => inTime(promise, 'a prompt answer', 1000);
     const counts = () => prompt(progress(connection));
@@ -380,9 +378,12 @@ test('Nothing waits for a comparison that does not end', () => {
     // A maximum that was too large can be lowered while it lasts.
     await prompt(ask(connection, 'SetEnabled', true));
     await eventually(counts, [0, 36 * 36]);
-    await prompt(ask(connection, 'SetMaximumEvaluationStepCount', 5));
-    await finished(connection, 36 * 36);
-    assert.deepEqual(await ask(connection, 'HighestStepCountReached'), [5]);
+    await connection.call('Server.Subscribe', [evaluationChanged]);
+    await prompt(ask(connection, 'SetMaximumEvaluationStepCount', 300));
+    do // A client need not ask before it is told.
+      await told(connection, evaluationChanged);
+    while (!isDeepStrictEqual(await counts(), [36 * 36, 36 * 36]));
+    assert.deepEqual(await ask(connection, 'HighestStepCountReached'), [300]);
 
     await setMost(connection);
     await eventually(counts, [0, 36 * 36]);

@@ -12,7 +12,6 @@ using NMX::EResult;
 using NMX::IResult;
 using testing::_;
 using testing::DoAll;
-using testing::NiceMock;
 using testing::Return;
 using testing::SetArgReferee;
 using testing::StrictMock;

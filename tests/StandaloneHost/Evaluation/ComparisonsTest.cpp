@@ -8,7 +8,6 @@
 
 using Evaluation::Comparisons;
 using Evaluation::MarkerLayout;
-using Evaluation::Match;
 using testing::ElementsAre;
 using Id = Comparisons::Id;
 using Pair = std::pair<std::uint64_t, std::uint64_t>;
