@@ -1,5 +1,6 @@
 #include "StandaloneHost/Evaluation/VObjectEvaluationEngine.h"
 
+#include "StandaloneHost/Evaluation/ConfusionWarnings.h"
 #include "StandaloneHost/Evaluation/EvaluationSettings.h"
 #include "StandaloneHost/Store/IArchive.h"
 #include "StandaloneHost/Store/VStore.h"
@@ -40,14 +41,16 @@ Positions Shape(unsigned number, std::size_t count = 6)
   return markers;
 }
 
-/// So many markers so close together that a comparison of two such objects has no end.
+/// So many markers so close together that a comparison of two such objects has no end, if many of them are needed.
 Positions Crowd(unsigned number)
 {
-  Positions markers = Shape(number, 40);
+  Positions markers = Shape(number, 60);
   for (auto& marker : markers)
     marker = {marker.x / 5, marker.y / 5, marker.z / 5};
   return markers;
 }
+
+constexpr std::uint32_t manyMarkers = 40;
 
 struct Archive : Store::IArchive
 {
@@ -289,12 +292,33 @@ TEST_F(ObjectEvaluationEngineTest, SwitchingItOffClearsWarningsInTheSameEditAndO
   EXPECT_TRUE(EventuallyWarns(other, "likely"));
 }
 
+TEST_F(ObjectEvaluationEngineTest, FindingsThatAreNotFinalOnlyRaiseWarningsAndNothingIsWrittenWhileItIsOff)
+{
+  const Id crate = Add("Crate", Shape(1));
+  const auto write = [&](std::optional<double> closest, bool final)
+  {
+    bool changed = false;
+    EXPECT_TRUE(Evaluation::WriteWarnings(*store, {{crate, closest, final}, {Id(99), 0.0, true}}, changed).Succeeded());
+    return Warning(crate) + (changed ? " changed" : "");
+  };
+  EXPECT_EQ(write(0.0, true), "-");
+  engine->Stop();
+  EXPECT_TRUE(engine->SetEnabled(true).Succeeded());
+  EXPECT_EQ(write(4.0, false), "possible changed");
+  EXPECT_EQ(write(std::nullopt, false), "possible");
+  EXPECT_EQ(write(1.0, false), "likely changed");
+  EXPECT_EQ(write(4.0, false), "likely");
+  EXPECT_EQ(write(4.0, true), "possible changed");
+  EXPECT_EQ(write(std::nullopt, true), "- changed");
+}
+
 TEST_F(ObjectEvaluationEngineTest, NothingWaitsForALongComparison)
 {
   const Id one = Add("One", Crowd(1));
   const Id other = Add("Other", Crowd(2));
+  for (const Id id : {one, other})
+    EXPECT_TRUE(Set(id, Paths::EntranceThreshold(), manyMarkers).Succeeded());
   EXPECT_TRUE(engine->SetMaximumEvaluationStepCount(~0ULL).Succeeded());
-  EXPECT_TRUE(engine->SetWarningThreshold(20).Succeeded());
   EXPECT_TRUE(engine->SetEnabled(true).Succeeded());
   ASSERT_TRUE(Eventually([&] { return Progress() == std::pair(0UL, 4UL); }));
 
@@ -304,6 +328,7 @@ TEST_F(ObjectEvaluationEngineTest, NothingWaitsForALongComparison)
   EXPECT_TRUE(Set(one, Paths::Enabled(), false).Succeeded());
   EXPECT_TRUE(Set(other, Paths::Enabled(), false).Succeeded());
   EXPECT_TRUE(Eventually([&] { return Progress() == std::pair(1UL, 1UL); }));
+  EXPECT_TRUE(Set(crate, Paths::EntranceThreshold(), manyMarkers).Succeeded());
   EXPECT_TRUE(Set(crate, Paths::Markers(), Crowd(3)).Succeeded());
   EXPECT_TRUE(Eventually([&] { return Progress() == std::pair(0UL, 1UL); }));
 
