@@ -39,24 +39,29 @@ EvaluatedObject ReadObject(const NMX::IStoreReader& reader, NMX::TSubjectStoreId
   EvaluatedObject object;
   const bool* enabled = Find<bool>(reader, id, NMX::Paths::Enabled());
   object.enabled = enabled != nullptr && *enabled;
-  if (!object.enabled)
-    return object;
 
   // A basic object has the one, a smart object the other.
-  std::vector<Eigen::Vector3d> markers;
   for (const NMX::EntryPath path : {NMX::Paths::Markers(), NMX::Paths::AdditionalMarkerPositions()})
-    if (const auto* positions = Find<std::vector<NMX::Position>>(reader, id, path))
-    {
-      if (!Comparable(*positions))
-        return object;
+  {
+    const auto* positions = Find<std::vector<NMX::Position>>(reader, id, path);
+    if (positions == nullptr)
+      continue;
+    object.comparable = Comparable(*positions);
+    if (object.comparable)
       for (const NMX::Position& place : *positions)
-        markers.emplace_back(place.x, place.y, place.z);
-    }
+        object.markers.emplace_back(place.x, place.y, place.z);
+  }
   const auto* chosen = Find<std::uint32_t>(reader, id, NMX::Paths::EntranceThreshold());
-  const std::size_t threshold =
-      chosen != nullptr && *chosen != 0 ? *chosen : MarkerLayout::DefaultEntranceThreshold(markers.size());
-  object.layout = std::make_shared<const MarkerLayout>(std::move(markers), threshold);
+  object.entranceThreshold =
+      chosen != nullptr && *chosen != 0 ? *chosen : MarkerLayout::DefaultEntranceThreshold(object.markers.size());
   return object;
+}
+
+std::shared_ptr<const MarkerLayout> MakeLayout(EvaluatedObject object)
+{
+  if (!object.enabled || !object.comparable)
+    return nullptr;
+  return std::make_shared<const MarkerLayout>(std::move(object.markers), object.entranceThreshold);
 }
 
 bool MayDiffer(const NMX::ChangeStamps& before, const NMX::ChangeStamps& now)

@@ -128,6 +128,8 @@ void EvaluationWorker::Look()
     if (settings.enabled)
       differences = FindDifferences(*reader, gone);
   }
+  for (Difference& difference : differences)
+    difference.layout = MakeLayout(std::move(difference.object));
   const std::lock_guard lock(m_mutex);
   TakeOver(settings);
   for (const Difference& difference : differences)
@@ -189,7 +191,7 @@ std::vector<EvaluationWorker::Difference> EvaluationWorker::FindDifferences(cons
     for (; known != m_known.end() && known->first < id; ++known)
       gone.push_back(known->first);
     const Known* before = known != m_known.end() && known->first == id ? &(known++)->second : nullptr;
-    Difference difference{id, {}, true, nullptr};
+    Difference difference{id, {}, true, {}, nullptr};
     if (reader.Stamps(id, difference.known.stamps).Failed() ||
         (before != nullptr && before->stamps == difference.known.stamps))
       continue;
@@ -200,9 +202,8 @@ std::vector<EvaluationWorker::Difference> EvaluationWorker::FindDifferences(cons
     }
     else
     {
-      EvaluatedObject object = ReadObject(reader, id);
-      difference.known.comparable = !object.enabled || object.layout != nullptr;
-      difference.layout = std::move(object.layout);
+      difference.object = ReadObject(reader, id);
+      difference.known.comparable = difference.object.comparable;
     }
     differences.push_back(std::move(difference));
   }

@@ -3,6 +3,7 @@
 #include "HostInterface/NMX/IMultiCallbackPostal.h"
 #include "StandaloneHost/Evaluation/Bell.h"
 #include "StandaloneHost/Evaluation/Comparisons.h"
+#include "StandaloneHost/Evaluation/EvaluatedObject.h"
 #include "StandaloneHost/Evaluation/EvaluationSettings.h"
 #include "StoreInterface/IStore.h"
 
@@ -66,6 +67,7 @@ private:
     Id id;
     Known known;
     bool otherObject = true; ///< rather than other warnings only
+    EvaluatedObject object;
     Comparisons::Layout layout;
   };
 
