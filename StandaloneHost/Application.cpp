@@ -108,8 +108,9 @@ void RunApplication(const Options& options)
   const auto evaluation = StartEvaluation(store, options);
   try
   {
-    const auto settings = std::make_shared<VPluginSettings>(options.features, HostSettings{evaluation});
-    VPluginHost host({store, postal, server, settings});
+    const auto settings =
+        std::make_shared<VPluginSettings>(options.features, HostSettings{nullptr, nullptr, evaluation});
+    VPluginHost host({store, postal, server, settings, nullptr});
     (void)plugin->RegisterServices(host);
     plugin->RegistrationFinished();
     server->Open();

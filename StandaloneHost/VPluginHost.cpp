@@ -78,7 +78,7 @@ void VPluginHost::Settings(std::shared_ptr<IPluginSettings>& settings) const
 
 void VPluginHost::DeviceLayoutRegistry(std::shared_ptr<IDeviceLayoutRegistry>& registry) const
 {
-  registry.reset();
+  registry = m_services.deviceLayouts;
 }
 
 void VPluginHost::UndoManager(std::shared_ptr<IRunaCoreUndoManager>& undoManager) const
@@ -111,9 +111,14 @@ void VPluginSettings::Features(std::shared_ptr<IFeatures>& features) const
   features = m_features;
 }
 
+void VPluginSettings::FileLocations(std::shared_ptr<IFileLocations>& locations) const
+{
+  locations = m_settings.fileLocations;
+}
+
 void VPluginSettings::SmartObjectControls(std::shared_ptr<ISmartObjectControls>& controls) const
 {
-  controls.reset();
+  controls = m_settings.smartObjects;
 }
 
 void VPluginSettings::RigidObjectControls(std::shared_ptr<IRigidObjectControls>& controls) const

@@ -13,6 +13,7 @@ struct HostServices
   std::shared_ptr<NMX::IAsioPostalService> notificationPostal;
   std::shared_ptr<TerminalServer2::IServer> server;
   std::shared_ptr<RunaCorePluginInterface::IPluginSettings> settings;
+  std::shared_ptr<RunaCorePluginInterface::IDeviceLayoutRegistry> deviceLayouts;
 };
 
 /// The standalone host as the plugin sees it. What it does not have it leaves empty. [host]
@@ -45,6 +46,8 @@ private:
 /// What the services are configured with, where the host has it.
 struct HostSettings
 {
+  std::shared_ptr<IFileLocations> fileLocations;
+  std::shared_ptr<ISmartObjectControls> smartObjects;
   std::shared_ptr<RunaCorePluginInterface::IObjectEvaluationSettings> objectEvaluation;
 };
 
@@ -55,6 +58,7 @@ public:
   explicit VPluginSettings(std::uint32_t featureMask, HostSettings settings = {});
 
   void Features(std::shared_ptr<RunaCorePluginInterface::IFeatures>& features) const override;
+  void FileLocations(std::shared_ptr<IFileLocations>& locations) const override;
   void SmartObjectControls(std::shared_ptr<ISmartObjectControls>& controls) const override;
   void RigidObjectControls(std::shared_ptr<IRigidObjectControls>& controls) const override;
   void ObjectEvaluationSettings(

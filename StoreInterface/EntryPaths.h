@@ -178,6 +178,11 @@ template <PathText path>
 {
   return PathConstant<"Warnings/WarningObjectConfusionCritical">();
 }
+/// Whether the host assigns active marker patterns by itself; an application entry.
+[[nodiscard]] inline EntryPath AutoPatternManagement()
+{
+  return PathConstant<"Application/Settings/SmartObjects/AutoPatternManagement">();
+}
 /// The markers of a basic object, in mm in the object's own frame.
 [[nodiscard]] inline EntryPath Markers()
 {

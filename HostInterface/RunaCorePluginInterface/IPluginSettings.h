@@ -3,6 +3,7 @@
 #include <cstdint>
 #include <memory>
 
+class IFileLocations;
 class ISmartObjectControls;
 class IRigidObjectControls;
 
@@ -44,6 +45,7 @@ public:
   virtual ~IPluginSettings() = default;
 
   virtual void Features(std::shared_ptr<IFeatures>& features) const = 0;
+  virtual void FileLocations(std::shared_ptr<IFileLocations>& locations) const = 0;
   virtual void SmartObjectControls(std::shared_ptr<ISmartObjectControls>& controls) const = 0;
   virtual void RigidObjectControls(std::shared_ptr<IRigidObjectControls>& controls) const = 0;
   virtual void ObjectEvaluationSettings(std::shared_ptr<IObjectEvaluationSettings>& settings) const = 0;

@@ -7,6 +7,8 @@
 #include "HostInterface/TerminalServer2/IServer.h"
 #include "RunaCorePluginSubjectStore/Catalogue/BasicObjectCatalogue.h"
 #include "RunaCorePluginSubjectStore/Catalogue/ObjectEvaluationCatalogue.h"
+#include "RunaCorePluginSubjectStore/Catalogue/SmartObjectCatalogue.h"
+#include "RunaCorePluginSubjectStore/SmartObjectServices/DeviceTypes.h"
 
 #include <utility>
 
@@ -70,6 +72,21 @@ bool VRunaCorePluginSubjectStore::RegisterServices(IPluginHost& host)
     auto service = NMX::MakeShared<BasicObjectServices::VBasicObjectServices>(Store(host));
     Publish<NMX::IBasicObjectServices>(host, Catalogue::BasicObjectGroup(), service);
     m_basicObjectServices = std::move(service);
+  }
+  if ((FeatureMask(host) & Feature::smartObjects) != 0)
+  {
+    std::shared_ptr<IDeviceLayoutRegistry> layouts;
+    host.DeviceLayoutRegistry(layouts);
+    if (layouts)
+      SmartObjectServices::RegisterDeviceTypes(*layouts);
+    std::shared_ptr<ISmartObjectControls> controls;
+    Settings(host)->SmartObjectControls(controls);
+    std::shared_ptr<IFileLocations> locations;
+    Settings(host)->FileLocations(locations);
+    auto service = NMX::MakeShared<SmartObjectServices::VSmartObjectServices>(Store(host), std::move(controls),
+                                                                              std::move(locations));
+    Publish<NMX::ISmartObjectServices>(host, Catalogue::SmartObjectGroup(), service);
+    m_smartObjectServices = std::move(service);
   }
   if ((FeatureMask(host) & Feature::objectEvaluation) != 0)
   {

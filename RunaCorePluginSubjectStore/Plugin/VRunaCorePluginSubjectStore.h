@@ -3,6 +3,7 @@
 #include "HostInterface/RunaCorePluginInterface/IPlugin.h"
 #include "RunaCorePluginSubjectStore/BasicObjectServices/VBasicObjectServices.h"
 #include "RunaCorePluginSubjectStore/ObjectEvaluationServices/VObjectEvaluationServices.h"
+#include "RunaCorePluginSubjectStore/SmartObjectServices/VSmartObjectServices.h"
 
 #include <memory>
 
@@ -21,4 +22,5 @@ public:
 private:
   std::shared_ptr<BasicObjectServices::VBasicObjectServices> m_basicObjectServices;
   std::shared_ptr<ObjectEvaluationServices::VObjectEvaluationServices> m_objectEvaluationServices;
+  std::shared_ptr<SmartObjectServices::VSmartObjectServices> m_smartObjectServices;
 };

@@ -35,7 +35,7 @@ const std::map<std::string, std::set<std::string>> allowed{
     {"RunaCorePluginSubjectStore/Plugin",
      {"RunaCorePluginSubjectStore/Catalogue", "RunaCorePluginSubjectStore/TerminalServer2",
       "RunaCorePluginSubjectStore/BasicObjectServices", "RunaCorePluginSubjectStore/ObjectEvaluationServices",
-      "HostInterface", "StoreInterface"}},
+      "RunaCorePluginSubjectStore/SmartObjectServices", "HostInterface", "StoreInterface"}},
 
     {"StandaloneHost/Store", {"HostInterface", "StoreInterface"}},
     {"StandaloneHost/Evaluation", {"HostInterface", "StoreInterface"}},

@@ -2,9 +2,11 @@
 #include "RunaCorePluginSubjectStore/BasicObjectServices/VBasicObjectServices.h"
 #include "RunaCorePluginSubjectStore/Catalogue/BasicObjectCatalogue.h"
 #include "RunaCorePluginSubjectStore/Catalogue/ObjectEvaluationCatalogue.h"
+#include "RunaCorePluginSubjectStore/Catalogue/SmartObjectCatalogue.h"
 #include "RunaCorePluginSubjectStore/CharacterFromClustersServices/CharacterWarnings.h"
 #include "RunaCorePluginSubjectStore/ObjectEvaluationServices/VObjectEvaluationServices.h"
 #include "RunaCorePluginSubjectStore/SmartObjectServices/SmartObjectWarnings.h"
+#include "RunaCorePluginSubjectStore/SmartObjectServices/VSmartObjectServices.h"
 #include "RunaCorePluginSubjectStore/Subjects/Warnings.h"
 #include "StandaloneHost/Store/VStore.h"
 #include "tests/Support/ManualPostal.h"
@@ -75,6 +77,14 @@ void RegisterBasicObjects(RecordingServer& server, std::uint32_t mask)
                                            std::make_shared<ManualPostal>(), mask);
 }
 
+void RegisterSmartObjects(RecordingServer& server, std::uint32_t mask)
+{
+  const auto service =
+      NMX::MakeShared<SmartObjectServices::VSmartObjectServices>(NMX::MakeShared<Store::VStore>(), nullptr, nullptr);
+  RegisterGroup<NMX::ISmartObjectServices>(server, Catalogue::SmartObjectGroup(), service,
+                                           std::make_shared<ManualPostal>(), mask);
+}
+
 void RegisterObjectEvaluation(RecordingServer& server, std::uint32_t mask)
 {
   const auto service =
@@ -140,7 +150,9 @@ json::object Describe(const TypeRecord& record)
 TEST(PublishedApi, GroupsAreRegisteredAsPromisedInTheirOrder)
 {
   const std::map<std::string, void (*)(RecordingServer&, std::uint32_t)> groups{
-      {"BasicObjectServices", RegisterBasicObjects}, {"ObjectEvaluationServices", RegisterObjectEvaluation}};
+      {"BasicObjectServices", RegisterBasicObjects},
+      {"SmartObjectServices", RegisterSmartObjects},
+      {"ObjectEvaluationServices", RegisterObjectEvaluation}};
   EXPECT_EQ(Promised().at("groups").as_array().size(), groups.size());
   for (const json::value& group : Promised().at("groups").as_array())
   {
@@ -211,19 +223,20 @@ TEST(PublishedApi, FeatureBitsLowerTheLevelOfTheirFunctionsAndOfNoOthers)
   const std::set<std::string> autoAssign{"AutoAssignEnabled", "SetAutoAssignEnabled", "AutoAssignedName"};
   const std::set<std::string> grouping{"ProximityGroupName", "SetProximityGroupName", "TemplateGroupName",
                                        "SetTemplateGroupName"};
-  for (const std::uint32_t mask : {0x1U, 0x101U, 0x8001U, 0x8101U})
-  {
-    RecordingServer server;
-    RegisterBasicObjects(server, mask);
-    EXPECT_EQ(server.order.size(), 20U) << mask;
-    for (const auto& [full, level] : server.levels)
+  for (const auto& [registerGroup, count] : {std::pair(&RegisterBasicObjects, 20U), {&RegisterSmartObjects, 36U}})
+    for (const std::uint32_t mask : {0x3U, 0x103U, 0x8003U, 0x8103U})
     {
-      const std::string name = full.substr(full.find('.') + 1);
-      const bool lowered =
-          (autoAssign.contains(name) && (mask & 0x8000) == 0) || (grouping.contains(name) && (mask & 0x100) == 0);
-      EXPECT_EQ(level, lowered ? 1U : 2U) << full << " under " << mask;
+      RecordingServer server;
+      registerGroup(server, mask);
+      EXPECT_EQ(server.order.size(), count) << mask;
+      for (const auto& [full, level] : server.levels)
+      {
+        const std::string name = full.substr(full.find('.') + 1);
+        const bool lowered =
+            (autoAssign.contains(name) && (mask & 0x8000) == 0) || (grouping.contains(name) && (mask & 0x100) == 0);
+        EXPECT_EQ(level, lowered ? 1U : 2U) << full << " under " << mask;
+      }
     }
-  }
 }
 
 TEST(PublishedApi, EverythingOfObjectEvaluationHasTheLevelOfItsFeature)

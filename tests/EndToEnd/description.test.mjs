@@ -17,6 +17,7 @@ const simpleTypes = {
   'text': ['string'],
   'bool': ['boolean'],
   'double': ['number'],
+  'unsigned 32-bit': ['integer', 0, 2 ** 32 - 1],
   'unsigned 64-bit': ['integer', 0, 2 ** 64],
 };
 
@@ -29,8 +30,9 @@ function assertSchema(schema, type) {
     assert.deepEqual([schema.type, items.type, items.minItems, items.maxItems], ['array', 'array', 2, 2]);
     assert.deepEqual(items.items.map(item => item.type), ['integer', 'string']);
     assert.deepEqual(items.items[0].enum, values.map(value => value.number));
-  } else if (type === 'set of texts') {
-    assert.deepEqual([schema.type, schema.uniqueItems, schema.items.type], ['array', true, 'string']);
+  } else if (type === 'set of texts' || type === 'list of texts') {
+    const unique = type === 'set of texts' || undefined;
+    assert.deepEqual([schema.type, schema.uniqueItems, schema.items.type], ['array', unique, 'string']);
   } else {
     const [name, minimum, maximum] = simpleTypes[type];
     assert.deepEqual([schema.type, schema.minimum, schema.maximum], [name, minimum, maximum]);

@@ -56,13 +56,15 @@ TEST(PluginModule, ExportsThreeFunctionsThatWorkWithoutAPluginObject)
 TEST(PluginModule, RegistersTheGroupsThatTheMaskAllowsAndSurvivesItsDestruction)
 {
   const auto postal = NMX::MakeShared<Postal::VAsioPostalService>();
-  for (const auto& [mask, count] : {std::pair(0U, 0), std::pair(1U, 20), std::pair(0x200U, 11), std::pair(0x201U, 31)})
+  for (const auto& [mask, count] :
+       {std::pair(0U, 0), std::pair(1U, 20), std::pair(2U, 36), std::pair(0x200U, 11), std::pair(0x203U, 67)})
   {
     auto plugin = LoadPlugin(SUBJECT_STORE_PLUGIN_FILE);
     EXPECT_STREQ(plugin->PluginName(), "");
     EXPECT_STREQ(plugin->DisplayName(), "Subject and object UI");
     const auto server = std::make_shared<CountingServer>();
-    VPluginHost host({NMX::MakeShared<Store::VStore>(), postal, server, std::make_shared<VPluginSettings>(mask)});
+    VPluginHost host(
+        {NMX::MakeShared<Store::VStore>(), postal, server, std::make_shared<VPluginSettings>(mask), nullptr});
     EXPECT_TRUE(plugin->RegisterServices(host));
     EXPECT_EQ(server->count, count);
 
@@ -70,12 +72,12 @@ TEST(PluginModule, RegistersTheGroupsThatTheMaskAllowsAndSurvivesItsDestruction)
     plugin.reset();
     if (server->kept)
     {
-      std::string_view text = mask == 1 ? "[\"Nobody\"]" : "[\"Nobody\", \"Crate\"]";
+      std::string_view text = mask < 0x200 ? "[\"Nobody\"]" : "[\"Nobody\", \"Crate\"]";
       std::promise<NMX::IResult> result;
       server->kept->Invoke(text, [&](const NMX::IServerReply& reply) { result.set_value(reply.Result()); });
       // This host has no object evaluation.
       EXPECT_EQ(result.get_future().get(),
-                NMX::IResult(mask == 1 ? NMX::EResult::NotFound : NMX::EResult::NotSupported));
+                NMX::IResult(mask < 0x200 ? NMX::EResult::NotFound : NMX::EResult::NotSupported));
     }
   }
   postal->Stop();
@@ -86,7 +88,8 @@ TEST(PluginModule, AHostWithoutServerOrSettingsIsNoReasonToFail)
   auto plugin = LoadPlugin(SUBJECT_STORE_PLUGIN_FILE);
   VPluginHost nothing({});
   EXPECT_TRUE(plugin->RegisterServices(nothing));
-  VPluginHost noServer({NMX::MakeShared<Store::VStore>(), nullptr, nullptr, std::make_shared<VPluginSettings>(1)});
+  VPluginHost noServer(
+      {NMX::MakeShared<Store::VStore>(), nullptr, nullptr, std::make_shared<VPluginSettings>(1), nullptr});
   EXPECT_TRUE(plugin->RegisterServices(noServer));
 }
 
