@@ -27,6 +27,13 @@ public:
     return number;
   }
 
+  std::optional<std::uint32_t> Known(std::string_view text)
+  {
+    const std::shared_lock lock(m_mutex);
+    const auto known = m_numbers.find(text);
+    return known != m_numbers.end() ? std::optional(known->second) : std::nullopt;
+  }
+
   std::string_view Text(std::uint32_t number)
   {
     const std::shared_lock lock(m_mutex);
@@ -48,6 +55,12 @@ private:
 }
 
 EntryPath::EntryPath(std::string_view text) : m_number(PathNumbers::Instance().Number(text)) {}
+
+std::optional<EntryPath> EntryPath::Known(std::string_view text)
+{
+  const auto number = PathNumbers::Instance().Known(text);
+  return number ? std::optional(EntryPath(*number)) : std::nullopt;
+}
 
 std::string_view EntryPath::Text() const
 {

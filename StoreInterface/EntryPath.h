@@ -2,6 +2,7 @@
 
 #include <cstdint>
 #include <functional>
+#include <optional>
 #include <ostream>
 #include <string_view>
 
@@ -17,6 +18,9 @@ public:
   /// exist, never for text that a client may choose freely.
   explicit EntryPath(std::string_view text);
 
+  /// The path with that text, if it has been numbered: for text that may come from anywhere.
+  [[nodiscard]] static std::optional<EntryPath> Known(std::string_view text);
+
   [[nodiscard]] std::uint32_t Number() const { return m_number; }
   [[nodiscard]] std::string_view Text() const;
 
@@ -24,6 +28,8 @@ public:
   friend std::ostream& operator<<(std::ostream& out, EntryPath path) { return out << path.Text(); }
 
 private:
+  explicit EntryPath(std::uint32_t number) : m_number(number) {}
+
   std::uint32_t m_number;
 };
 

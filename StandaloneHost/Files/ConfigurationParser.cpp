@@ -1,13 +1,12 @@
 #include "StandaloneHost/Files/ConfigurationParser.h"
 
+#include "StandaloneHost/Files/ElementParts.h"
 #include "StandaloneHost/Files/ElementReader.h"
 #include "StandaloneHost/Files/EntryTree.h"
 #include "StandaloneHost/Files/ValueText.h"
 
 #include <algorithm>
 #include <array>
-#include <functional>
-#include <map>
 #include <utility>
 
 namespace Files
@@ -17,29 +16,6 @@ using NMX::EValueType;
 
 namespace
 {
-
-/// Notices what may stand only once among its siblings.
-class Once
-{
-public:
-  /// `what` names the thing in messages, `key` tells it from others.
-  void Check(const Place& place, std::string_view what, std::string_view key)
-  {
-    const auto [known, added] = m_places.emplace(key, place);
-    if (!added)
-      Fail(place, "repeated " + std::string(what) + ", expected it once (first at " + PlaceText(known->second) + ")");
-  }
-
-private:
-  std::map<std::string, Place, std::less<>> m_places;
-};
-
-template <class T>
-T ReadAttribute(const Element& element, std::string_view attribute)
-{
-  return ReadAs<T>(element.place, "attribute " + Quoted(attribute) + " of " + Tag(element.name),
-                   element.RequiredAttribute(attribute));
-}
 
 std::string OptionalAttribute(const Element& element, std::string_view attribute)
 {
@@ -55,16 +31,11 @@ public:
   void Parse();
 
 private:
-  /// Reads each child of the element that was entered last; all have that name.
-  template <class ReadChild>
-  void ForEachChild(std::string_view name, ReadChild readChild);
-
   void ReadDevice(const Element& element);
   void ReadPreset(const Element& element);
   void ReadSubject(const Element& element);
   void ReadEntries(const EntryNode& node, std::vector<EntryContent>& entries, std::vector<FillingContent>& fillings);
   NMX::Value ReadEntry(const Element& element, EValueType type, std::vector<FillingContent>& fillings);
-  std::vector<NMX::Position> ReadMarkers();
   std::vector<NMX::SmartCluster> ReadClusters();
   std::vector<NMX::Slot> ReadSlots(std::vector<FillingContent>& fillings);
 
@@ -72,24 +43,9 @@ private:
   ConfigurationContent& m_content;
 };
 
-template <class ReadChild>
-void Parser::ForEachChild(std::string_view name, ReadChild readChild)
-{
-  while (const auto child = m_xml.EnterChild())
-  {
-    if (child->name != name)
-      FailUnknown(*child, {&name, 1});
-    readChild(*child);
-  }
-}
-
 void Parser::Parse()
 {
-  const Element root = m_xml.EnterRoot("SubjectConfiguration");
-  root.AllowAttributes({"version"});
-  if (const std::string& version = root.RequiredAttribute("version"); version != "1")
-    Fail(root.place, "the version is " + Quoted(version) + ", expected 1");
-
+  EnterFirstVersion(m_xml, "SubjectConfiguration");
   constexpr std::array<std::string_view, 3> sections{"Devices", "Presets", "Subjects"};
   Once once;
   while (const auto section = m_xml.EnterChild())
@@ -99,11 +55,11 @@ void Parser::Parse()
     once.Check(section->place, Tag(section->name), section->name);
     section->AllowAttributes({});
     if (section->name == "Devices")
-      ForEachChild("Device", [this](const Element& element) { ReadDevice(element); });
+      ForEachChild(m_xml, "Device", [this](const Element& element) { ReadDevice(element); });
     else if (section->name == "Presets")
-      ForEachChild("Preset", [this](const Element& element) { ReadPreset(element); });
+      ForEachChild(m_xml, "Preset", [this](const Element& element) { ReadPreset(element); });
     else
-      ForEachChild("Subject", [this](const Element& element) { ReadSubject(element); });
+      ForEachChild(m_xml, "Subject", [this](const Element& element) { ReadSubject(element); });
   }
   m_xml.End();
 }
@@ -182,7 +138,7 @@ NMX::Value Parser::ReadEntry(const Element& element, EValueType type, std::vecto
   switch (type)
   {
   case EValueType::Positions:
-    return ReadMarkers();
+    return ReadMarkers(m_xml);
   case EValueType::SmartClusters:
     return ReadClusters();
   case EValueType::Slots:
@@ -192,24 +148,10 @@ NMX::Value Parser::ReadEntry(const Element& element, EValueType type, std::vecto
   }
 }
 
-std::vector<NMX::Position> Parser::ReadMarkers()
-{
-  std::vector<NMX::Position> markers;
-  ForEachChild("Marker",
-               [&](const Element& element)
-               {
-                 element.AllowAttributes({"x", "y", "z"});
-                 markers.push_back({ReadAttribute<double>(element, "x"), ReadAttribute<double>(element, "y"),
-                                    ReadAttribute<double>(element, "z")});
-                 m_xml.LeaveEmpty();
-               });
-  return markers;
-}
-
 std::vector<NMX::SmartCluster> Parser::ReadClusters()
 {
   std::vector<NMX::SmartCluster> clusters;
-  ForEachChild("SmartCluster",
+  ForEachChild(m_xml, "SmartCluster",
                [&](const Element& element)
                {
                  element.AllowAttributes({"label", "device", "pattern", "type"});
@@ -225,7 +167,7 @@ std::vector<NMX::Slot> Parser::ReadSlots(std::vector<FillingContent>& fillings)
 {
   std::vector<NMX::Slot> slots;
   Once once;
-  ForEachChild("Slot",
+  ForEachChild(m_xml, "Slot",
                [&](const Element& element)
                {
                  element.AllowAttributes({"name", "object"});

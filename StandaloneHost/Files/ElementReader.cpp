@@ -1,7 +1,5 @@
 #include "StandaloneHost/Files/ElementReader.h"
 
-#include "StandaloneHost/Files/TextFile.h"
-
 #include <QString>
 #include <QXmlStreamReader>
 
@@ -16,6 +14,25 @@ namespace
 std::string ToText(QStringView text)
 {
   return text.toUtf8().toStdString();
+}
+
+/// Where something begins that is no white space, comment or processing instruction.
+qsizetype AfterComments(QStringView text)
+{
+  qsizetype at = 0;
+  for (;;)
+  {
+    // A second byte order mark, which the XML reader skips.
+    while (at < text.size() && (text[at].isSpace() || text[at] == QChar::ByteOrderMark))
+      ++at;
+    const bool comment = text.sliced(at).startsWith(u"<!--");
+    if (!comment && !text.sliced(at).startsWith(u"<?"))
+      return at;
+    const qsizetype end = comment ? text.indexOf(u"-->", at + 4) : text.indexOf(u"?>", at + 2);
+    if (end < 0)
+      return at;
+    at = end + (comment ? 3 : 2);
+  }
 }
 
 }
@@ -62,9 +79,13 @@ class ElementReader::Tokens
 public:
   using Type = QXmlStreamReader::TokenType;
 
-  explicit Tokens(const std::filesystem::path& file)
-      : m_file(file), m_text(QString::fromStdString(ReadTextFile(file))), m_xml(m_text), m_place{&file}
+  Tokens(const std::filesystem::path& file, std::size_t maximumBytes)
+      : m_file(file), m_text(QString::fromStdString(ReadTextFile(file, maximumBytes))), m_xml(m_text), m_place{&file}
   {
+    // The XML reader tells of a declaration only after it has carried it out, which can take it minutes.
+    const qsizetype begin = AfterComments(m_text);
+    if (QStringView(m_text).sliced(begin).startsWith(u"<!DOCTYPE"))
+      Fail(PlaceAt(begin), "a document type declaration is not allowed, expected elements only");
     m_xml.setNamespaceProcessing(false);
   }
 
@@ -120,9 +141,6 @@ private:
   {
     if (m_xml.hasError())
       FailSyntax();
-    if (m_xml.isDTD())
-      Fail(PlaceAt(m_text.lastIndexOf(u"<!DOCTYPE", m_xml.characterOffset())),
-           "a document type declaration is not allowed, expected elements only");
     if (const QStringView encoding = m_xml.documentEncoding();
         !encoding.isEmpty() && encoding.compare(u"UTF-8", Qt::CaseInsensitive) != 0)
       Fail(PlaceAt(0), "the declared encoding is " + Quoted(ToText(encoding)) + ", expected UTF-8");
@@ -165,7 +183,10 @@ private:
   std::vector<std::string> m_open;
 };
 
-ElementReader::ElementReader(const std::filesystem::path& file) : m_tokens(std::make_unique<Tokens>(file)) {}
+ElementReader::ElementReader(const std::filesystem::path& file, std::size_t maximumBytes)
+    : m_tokens(std::make_unique<Tokens>(file, maximumBytes))
+{
+}
 
 ElementReader::~ElementReader() = default;
 

@@ -1,7 +1,9 @@
 #pragma once
 
 #include "StandaloneHost/Files/ConfigurationError.h"
+#include "StandaloneHost/Files/TextFile.h"
 
+#include <cstddef>
 #include <filesystem>
 #include <initializer_list>
 #include <memory>
@@ -40,7 +42,7 @@ struct Element
 class ElementReader
 {
 public:
-  explicit ElementReader(const std::filesystem::path& file);
+  explicit ElementReader(const std::filesystem::path& file, std::size_t maximumBytes = maximumFileBytes);
   ~ElementReader();
 
   /// Enters the file's outermost element, which must have that name.

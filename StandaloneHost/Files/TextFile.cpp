@@ -15,7 +15,7 @@ namespace
 {
 
 /// How many bytes the file has, when it is one that can be read at all.
-std::size_t CheckedSize(const std::filesystem::path& file)
+std::size_t CheckedSize(const std::filesystem::path& file, std::size_t maximumBytes)
 {
   std::error_code error;
   const auto status = std::filesystem::status(file, error);
@@ -28,9 +28,8 @@ std::size_t CheckedSize(const std::filesystem::path& file)
   const auto size = std::filesystem::file_size(file, error);
   if (error)
     Fail({&file}, "the file cannot be read: " + error.message());
-  if (size > maximumFileBytes)
-    Fail({&file},
-         "the file has " + std::to_string(size) + " bytes, expected at most " + std::to_string(maximumFileBytes));
+  if (size > maximumBytes)
+    Fail({&file}, "the file has " + std::to_string(size) + " bytes, expected at most " + std::to_string(maximumBytes));
   return static_cast<std::size_t>(size);
 }
 
@@ -70,10 +69,10 @@ void CheckText(const std::filesystem::path& file, std::string_view text)
 
 }
 
-std::string ReadTextFile(const std::filesystem::path& file)
+std::string ReadTextFile(const std::filesystem::path& file, std::size_t maximumBytes)
 {
   constexpr std::string_view byteOrderMark = "\xEF\xBB\xBF";
-  std::string text(CheckedSize(file), '\0');
+  std::string text(CheckedSize(file, maximumBytes), '\0');
   errno = 0;
   std::ifstream in(file, std::ios::binary);
   in.read(text.data(), static_cast<std::streamsize>(text.size()));

@@ -1,5 +1,7 @@
 #include "StandaloneHost/Store/Derivation.h"
 
+#include "StandaloneHost/Store/ObjectWarnings.h"
+
 #include <set>
 
 namespace Store
@@ -40,6 +42,7 @@ std::set<Id> TouchedCharacters(const Draft& draft)
 
 void DeriveDependents(Draft& draft)
 {
+  DeriveObjectWarnings(draft); // first: characters are warned of their objects' warnings
   const std::uint64_t childWarning = KindSchema::ChildWarningBit();
   for (const Id id : TouchedCharacters(draft))
   {

@@ -1,5 +1,7 @@
 #include "StandaloneHost/Store/StoreState.h"
 
+#include "StandaloneHost/Store/ObjectLinks.h"
+
 #include <utility>
 
 namespace Store
@@ -10,6 +12,13 @@ const std::set<NMX::TSubjectStoreId>& StoreState::Subjects(NMX::ESubjectKind kin
   return m_kinds[static_cast<std::size_t>(kind)];
 }
 
+const std::set<NMX::TSubjectStoreId>& StoreState::Linked(const std::string& key) const
+{
+  static const std::set<NMX::TSubjectStoreId> none;
+  const auto found = m_links.find(key);
+  return found != m_links.end() ? found->second : none;
+}
+
 void StoreState::Erase(NMX::TSubjectStoreId id)
 {
   const auto found = m_records.find(id);
@@ -17,6 +26,9 @@ void StoreState::Erase(NMX::TSubjectStoreId id)
     return;
   m_names.erase(found->second->Name());
   m_kinds[static_cast<std::size_t>(found->second->kind)].erase(id);
+  for (const std::string& key : LinksOf(*found->second))
+    if (const auto link = m_links.find(key); link->second.erase(id) != 0 && link->second.empty())
+      m_links.erase(link);
   m_records.erase(found);
 }
 
@@ -26,6 +38,8 @@ void StoreState::Insert(std::unique_ptr<SubjectRecord> record)
   place = std::move(record);
   m_names.emplace(place->Name(), place.get());
   m_kinds[static_cast<std::size_t>(place->kind)].insert(place->id);
+  for (const std::string& key : LinksOf(*place))
+    m_links[key].insert(place->id);
 }
 
 void StoreState::Apply(ChangeSet&& changes) noexcept

@@ -49,6 +49,9 @@ public:
   }
 
   [[nodiscard]] const std::set<NMX::TSubjectStoreId>& Subjects(NMX::ESubjectKind kind) const;
+
+  /// The objects that have a link (see LinksOf).
+  [[nodiscard]] const std::set<NMX::TSubjectStoreId>& Linked(const std::string& key) const;
   [[nodiscard]] const std::map<NMX::EntryPath, NMX::Value>& ApplicationEntries() const { return m_application; }
   [[nodiscard]] NMX::TSubjectStoreId NextId() const { return m_nextId; }
   [[nodiscard]] std::size_t SubjectCount() const { return m_records.size(); }
@@ -65,6 +68,7 @@ private:
       m_records;
   boost::unordered_flat_map<std::string_view, const SubjectRecord*> m_names; // keys look into the records
   std::array<std::set<NMX::TSubjectStoreId>, NMX::allSubjectKinds.size()> m_kinds;
+  boost::unordered_flat_map<std::string, std::set<NMX::TSubjectStoreId>> m_links;
   std::map<NMX::EntryPath, NMX::Value> m_application;
   NMX::TSubjectStoreId m_nextId{1};
   std::uint64_t m_lastStamp = 0;

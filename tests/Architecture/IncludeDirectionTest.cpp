@@ -42,9 +42,11 @@ const std::map<std::string, std::set<std::string>> allowed{
     {"StandaloneHost/Postal", {"HostInterface"}},
     {"StandaloneHost/Server", {"HostInterface"}},
     {"StandaloneHost/Files", {"StandaloneHost/Store", "HostInterface", "StoreInterface"}},
+    {"StandaloneHost/SmartObjects",
+     {"StandaloneHost/Files", "StandaloneHost/Store", "HostInterface", "StoreInterface"}},
     {"StandaloneHost",
      {"StandaloneHost/Store", "StandaloneHost/Postal", "StandaloneHost/Server", "StandaloneHost/Files",
-      "StandaloneHost/Evaluation", "HostInterface", "StoreInterface"}},
+      "StandaloneHost/Evaluation", "StandaloneHost/SmartObjects", "HostInterface", "StoreInterface"}},
 };
 
 /// The folder of `allowed` that a file belongs to: the deepest that its path begins with.

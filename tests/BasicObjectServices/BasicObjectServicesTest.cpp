@@ -154,10 +154,11 @@ TEST_F(BasicObjectServicesTest, WarningsAreThoseThatHoldInTheirOrderWithTheirTex
   EXPECT_TRUE(warnings.empty());
 
   Set(crate, NMX::EntryPath("Warnings/WarningObjectConfusion"), true);
-  Set(crate, NMX::EntryPath("Warnings/WarningProximityGroupMissingUnique"), true);
+  Set(crate, Paths::TemplateGroupName(), std::string("Crates"));
   Set(crate, NMX::EntryPath("Warnings/WarningBatteryLow"), true); // not one of a basic object
   EXPECT_TRUE(service->BasicObjectWarnings("Crate", warnings).Succeeded());
-  EXPECT_THAT(warnings, ElementsAre(Pair(Warning::ProximityGroupMissingUnique, "Proximity group has no unique object."),
+  EXPECT_THAT(warnings, ElementsAre(Pair(Warning::TemplateGroupNoProximityGroup,
+                                         "Object is in a template group, but isn't in a proximity group."),
                                     Pair(Warning::ObjectConfusion,
                                          "Object could be confused with another object, or another view of itself.")));
 }

@@ -19,13 +19,14 @@ const subjects = [
   { name: 'Barrel',
     parameters: { Enabled: false, ColourRGBA: '#80102030', ProximityGroupName: 'Stage left', TemplateGroupName: 'Kegs',
                   AutoAssignEnabled: true, AutoAssignedName: 'Left hand' },
-    warnings: ['ObjectConfusion', 'DuplicateDevice', 'ProximityGroupMissingUnique'] },
+    warnings: ['ObjectConfusion', 'BatteryLow'] },
   { name: 'Apple', warnings: ['ObjectConfusion'] },
   ...Object.entries(otherKinds).map(([kind, name]) => ({ kind, name })),
 ];
 
 const confusion = [5, 'Object could be confused with another object, or another view of itself.'];
 const missingUnique = [0, 'Proximity group has no unique object.'];
+const noProximityGroup = [2, "Object is in a template group, but isn't in a proximity group."];
 
 function named(name) {
   return `BasicObjectServices.${name}`;
@@ -81,9 +82,9 @@ const walk = [
   ['TemplateGroupName', ['Crate'], { TemplateGroupName: '' }],
   ['SetTemplateGroupName', ['Crate', '木箱 🧰\u0001\u2028'], {}],
   ['TemplateGroupName', ['Crate'], { TemplateGroupName: '木箱 🧰\u0001\u2028' }],
-  ['BasicObjectWarnings', ['Crate'], { Warnings: [] }],
+  ['BasicObjectWarnings', ['Crate'], { Warnings: [missingUnique] }],
   ['BasicObjectWarnings', ['Apple'], { Warnings: [confusion] }],
-  ['BasicObjectWarnings', ['Barrel'], { Warnings: [missingUnique, confusion] }],
+  ['BasicObjectWarnings', ['Barrel'], { Warnings: [noProximityGroup, confusion] }],
   ['Rename', ['Crate', 'Box'], {}],
   ['Color', ['Box'], { ColorHtml: '#01020304' }],
   ['BasicObjectList', [], { Names: ['Apple', 'Barrel', 'Box'] }],

@@ -69,7 +69,7 @@ TEST_F(ArchiveTest, KeepsEveryTypeOfValueExactly)
       {Paths::ColourRGBA(), NMX::Colour{1, 2, 3, 4}},
       {Paths::AdditionalMarkerPositions(), std::vector<NMX::Position>{{0.1, -2.5e-7, 1e300}, {}}},
       {Paths::SmartClusters(), std::vector<NMX::SmartCluster>{{"A", "urn:1", 4294967295U, "Corvex1"}, {}}},
-      {NMX::EntryPath("Warnings/WarningNoPattern"), true},
+      {NMX::EntryPath("Warnings/WarningBatteryLow"), true},
       {Paths::Flags(), 0x43U}};
   const std::vector<std::pair<NMX::EntryPath, NMX::Value>> adaValues{
       {Paths::Calibration(), -7},

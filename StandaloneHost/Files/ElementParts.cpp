@@ -1,0 +1,36 @@
+#include "StandaloneHost/Files/ElementParts.h"
+
+namespace Files
+{
+
+void Once::Check(const Place& place, std::string_view what, std::string_view key)
+{
+  const auto [known, added] = m_places.emplace(key, place);
+  if (!added)
+    Fail(place, "repeated " + std::string(what) + ", expected it once (first at " + PlaceText(known->second) + ")");
+}
+
+Element EnterFirstVersion(ElementReader& xml, std::string_view name)
+{
+  Element root = xml.EnterRoot(name);
+  root.AllowAttributes({"version"});
+  if (const std::string& version = root.RequiredAttribute("version"); version != "1")
+    Fail(root.place, "the version is " + Quoted(version) + ", expected 1");
+  return root;
+}
+
+std::vector<NMX::Position> ReadMarkers(ElementReader& xml)
+{
+  std::vector<NMX::Position> markers;
+  ForEachChild(xml, "Marker",
+               [&](const Element& element)
+               {
+                 element.AllowAttributes({"x", "y", "z"});
+                 markers.push_back({ReadAttribute<double>(element, "x"), ReadAttribute<double>(element, "y"),
+                                    ReadAttribute<double>(element, "z")});
+                 xml.LeaveEmpty();
+               });
+  return markers;
+}
+
+}
