@@ -1,13 +1,17 @@
 #include "StandaloneHost/Application.h"
 
 #include "HostInterface/NMX/GlobalLog.h"
+#include "HostInterface/NotificationSystem/VAsioPostalServiceStrand.h"
 #include "StandaloneHost/Evaluation/VObjectEvaluationEngine.h"
 #include "StandaloneHost/Files/SubjectConfiguration.h"
 #include "StandaloneHost/PluginModule.h"
 #include "StandaloneHost/Postal/VAsioPostalService.h"
 #include "StandaloneHost/Server/VServer.h"
+#include "StandaloneHost/SmartObjects/AutoPatternManagement.h"
+#include "StandaloneHost/SmartObjects/VSmartObjectControls.h"
 #include "StandaloneHost/Store/SqliteArchive.h"
 #include "StandaloneHost/Store/VStore.h"
+#include "StandaloneHost/VFileLocations.h"
 #include "StandaloneHost/VPluginHost.h"
 
 #include <csignal>
@@ -106,13 +110,18 @@ void RunApplication(const Options& options)
   const auto postal = NMX::MakeShared<Postal::VAsioPostalService>();
   const auto server = NMX::MakeShared<Server::VServer>(postal, options.server);
   const auto evaluation = StartEvaluation(store, options);
+  const auto layouts = std::make_shared<SmartObjects::DeviceLayouts>();
+  const auto smartObjects = std::make_shared<SmartObjects::VSmartObjectControls>(store, layouts);
+  std::shared_ptr<const void> patternManagement;
   try
   {
-    const auto settings =
-        std::make_shared<VPluginSettings>(options.features, HostSettings{nullptr, nullptr, evaluation});
-    VPluginHost host({store, postal, server, settings, nullptr});
+    const auto settings = std::make_shared<VPluginSettings>(
+        options.features, HostSettings{std::make_shared<VFileLocations>(options.dataFolder), smartObjects, evaluation});
+    VPluginHost host({store, postal, server, settings, layouts});
     (void)plugin->RegisterServices(host);
     plugin->RegistrationFinished();
+    patternManagement = SmartObjects::ManagePatterns(
+        store, smartObjects, NMX::MakeShared<NotificationSystem::VAsioPostalServiceStrand>(postal));
     server->Open();
     WriteReadyFile(options.readyFile, server->Address());
     std::printf("listening on http://%s and ws://%s/rpc\n", server->Address().c_str(), server->Address().c_str());

@@ -1,0 +1,261 @@
+#include "StandaloneHost/SmartObjects/VSmartObjectControls.h"
+
+#include "HostInterface/NMX/GlobalLog.h"
+#include "StandaloneHost/SmartObjects/PatternSets.h"
+#include "StandaloneHost/SmartObjects/TemplateFile.h"
+#include "StandaloneHost/Store/NameRule.h"
+#include "StoreInterface/EntryPaths.h"
+#include "StoreInterface/TypedAccess.h"
+
+#include <algorithm>
+#include <optional>
+#include <set>
+#include <system_error>
+#include <utility>
+
+namespace SmartObjects
+{
+
+using NMX::EResult;
+using NMX::ESubjectKind;
+using NMX::IResult;
+using NMX::TSubjectStoreId;
+
+namespace
+{
+
+using Clusters = std::vector<NMX::SmartCluster>;
+
+/// The type of device that smart objects can be made for.
+constexpr std::string_view supportedType = "Corvex1";
+
+struct Device
+{
+  std::string urn;
+  std::string type;
+};
+
+/// The devices of the stage, in the order of their URNs.
+std::vector<Device> Devices(const NMX::IStoreReader& access)
+{
+  constexpr std::string_view prefix = "Application/Devices/";
+  constexpr std::string_view suffix = "/Type";
+  std::vector<Device> devices;
+  for (const NMX::EntryPath path : access.ApplicationEntries(NMX::EntryPath("Application/Devices")))
+  {
+    const std::string_view text = path.Text();
+    if (!text.ends_with(suffix) || text.size() <= prefix.size() + suffix.size())
+      continue;
+    const auto* type = std::get_if<std::string>(access.FindApplicationEntry(path));
+    devices.push_back({std::string(text.substr(prefix.size(), text.size() - prefix.size() - suffix.size())),
+                       type != nullptr ? *type : std::string{}});
+  }
+  return devices;
+}
+
+/// Visits every cluster of the smart objects: `visit(cluster)`.
+template <class Visit>
+IResult ForEachCluster(const NMX::IStoreReader& access, Visit visit)
+{
+  std::vector<TSubjectStoreId> ids;
+  if (const IResult listed = access.Subjects(ESubjectKind::SmartObjects, ids); listed.Failed())
+    return listed;
+  for (const TSubjectStoreId id : ids)
+  {
+    Clusters clusters;
+    if (const IResult read = NMX::Read(access, id, NMX::Paths::SmartClusters(), clusters); read.Failed())
+      return read;
+    std::for_each(clusters.begin(), clusters.end(), visit);
+  }
+  return EResult::Ok;
+}
+
+/// Gives the clusters patterns of the present sets that no other cluster has, as long as there are any. False when one
+/// was left without.
+bool GiveFreePatterns(const NMX::IStoreReader& access, Clusters& clusters)
+{
+  std::set<std::pair<std::string, std::uint32_t>> taken;
+  if (ForEachCluster(access, [&](const NMX::SmartCluster& cluster) { taken.emplace(cluster.type, cluster.pattern); })
+          .Failed())
+    return false;
+  bool all = true;
+  for (NMX::SmartCluster& cluster : clusters)
+  {
+    const std::uint32_t size = CurrentPatternSet(access, cluster.type);
+    std::uint32_t pattern = 1;
+    while (pattern <= size && taken.contains({cluster.type, pattern}))
+      ++pattern;
+    cluster.pattern = pattern <= size ? pattern : 0;
+    taken.emplace(cluster.type, cluster.pattern);
+    all = all && cluster.pattern != 0;
+  }
+  return all;
+}
+
+/// Adds a smart object. Its clusters get patterns that are free, or else every cluster a pattern of a larger set, if
+/// there is one that serves them.
+IResult AddObject(NMX::IEntryEditor& editor, const std::string& name, Clusters clusters,
+                  std::vector<NMX::Position> additionalMarkers)
+{
+  const bool given = GiveFreePatterns(editor, clusters);
+  TSubjectStoreId id;
+  if (const IResult added = editor.Add(ESubjectKind::SmartObjects, name, id); added.Failed())
+    return added;
+  if (const IResult set = editor.SetValue(id, NMX::Paths::SmartClusters(), std::move(clusters)); set.Failed())
+    return set;
+  if (const IResult set = editor.SetValue(id, NMX::Paths::AdditionalMarkerPositions(), std::move(additionalMarkers));
+      set.Failed())
+    return set;
+  if (!given)
+    if (const IResult assigned = AssignPatterns(editor); assigned.Failed() && assigned != EResult::NotSupported)
+      return assigned;
+  return EResult::Ok;
+}
+
+/// Reads a template. `FileNotFound`, or `Failed` with the reason in the log.
+IResult ReadTemplateFile(const std::filesystem::path& file, const DeviceLayouts& layouts,
+                         std::optional<SmartObjectTemplate>& content)
+{
+  std::error_code error;
+  const auto status = std::filesystem::status(file, error);
+  if (status.type() == std::filesystem::file_type::not_found)
+    return EResult::FileNotFound;
+  try
+  {
+    content = ReadTemplate(file);
+  }
+  catch (const Files::ConfigurationError& failure)
+  {
+    NMX::Log(NMX::subjectStoreLog, NMX::ESeverity::Error, "The smart object template cannot be used: %1%",
+             failure.what());
+    return EResult::Failed;
+  }
+  for (const ClusterTemplate& cluster : content->clusters)
+    if (!layouts.Known(cluster.type))
+    {
+      NMX::Log(NMX::subjectStoreLog, NMX::ESeverity::Error,
+               "The smart object template cannot be used: %1%: there is no device type \"%2%\"", file.string(),
+               cluster.type);
+      return EResult::Failed;
+    }
+  return EResult::Ok;
+}
+
+/// A name for the object of a device: the URN, or the type with a number.
+std::string NameFor(NMX::IEntryEditor& editor, const Device& device)
+{
+  TSubjectStoreId known;
+  std::string name = device.urn;
+  for (int number = 1; editor.FindByName(name, known).Succeeded() || !Store::NameRule::Allows(name); ++number)
+    name = device.type + ' ' + std::to_string(number);
+  return name;
+}
+
+}
+
+VSmartObjectControls::VSmartObjectControls(std::shared_ptr<NMX::IStore> store,
+                                           std::shared_ptr<const DeviceLayouts> layouts)
+    : m_store(std::move(store)), m_layouts(std::move(layouts))
+{
+}
+
+IResult VSmartObjectControls::CreateFromTemplate(const std::string& name, const std::filesystem::path& file,
+                                                 ECreate create)
+{
+  if (file.native().find('\0') != std::filesystem::path::string_type::npos)
+    return EResult::InvalidArgument;
+  // Before the store is locked: a file can take its time.
+  std::optional<SmartObjectTemplate> content;
+  const IResult read = ReadTemplateFile(file, *m_layouts, content);
+  Clusters clusters;
+  if (content)
+    for (const ClusterTemplate& cluster : content->clusters)
+      clusters.push_back({cluster.label, {}, 0, cluster.type});
+
+  const auto editor = m_store->Editor();
+  TSubjectStoreId id;
+  if (read.Failed())
+  {
+    // A name that cannot be given is told first.
+    const IResult added = editor->Add(ESubjectKind::SmartObjects, name, id);
+    return added.Failed() ? added : read;
+  }
+  if (const IResult added = AddObject(*editor, name, std::move(clusters), std::move(content->additionalMarkers));
+      added.Failed())
+    return added;
+  return create == ECreate::Yes ? editor->Commit() : EResult::Ok;
+}
+
+IResult VSmartObjectControls::CreateForUnlinkedDevices(std::vector<std::string>& names)
+{
+  const auto editor = m_store->Editor();
+  std::set<std::string> linked;
+  std::set<std::string> types;
+  std::set<std::uint32_t> patterns;
+  if (const IResult visited = ForEachCluster(*editor,
+                                             [&](const NMX::SmartCluster& cluster)
+                                             {
+                                               linked.insert(cluster.deviceUrn);
+                                               types.insert(cluster.type);
+                                               if (cluster.pattern != 0)
+                                                 patterns.insert(cluster.pattern);
+                                             });
+      visited.Failed())
+    return visited;
+
+  std::vector<Device> devices = Devices(*editor);
+  std::erase_if(devices, [&](const Device& device) { return linked.contains(device.urn); });
+  if (devices.empty())
+    return EResult::Ok;
+  for (const Device& device : devices)
+    if (device.type != supportedType)
+    {
+      NMX::Log(NMX::subjectStoreLog, NMX::ESeverity::Error,
+               "No smart object can be made for device \"%1%\" of type \"%2%\"", device.urn, device.type);
+      return EResult::NotFound;
+    }
+  types.emplace(supportedType);
+  if (types.size() > 1)
+    return EResult::NotSupported;
+  if (devices.size() > patternSetSizes.back() - std::min<std::size_t>(patterns.size(), patternSetSizes.back()))
+    return EResult::AllocationFailure;
+
+  std::vector<std::string> made;
+  for (const Device& device : devices)
+  {
+    made.push_back(NameFor(*editor, device));
+    if (const IResult added = AddObject(*editor, made.back(), {{"Cluster", device.urn, 0, device.type}}, {});
+        added.Failed())
+      return added;
+  }
+  const IResult kept = editor->Commit();
+  if (kept.Succeeded())
+    names = std::move(made);
+  return kept;
+}
+
+IResult VSmartObjectControls::AssignOptimalPatterns()
+{
+  const auto editor = m_store->Editor();
+  if (const IResult known = CheckTypes(*editor); known.Failed())
+    return known;
+  if (const IResult assigned = AssignPatterns(*editor); assigned.Failed())
+    return assigned;
+  return editor->Commit();
+}
+
+IResult VSmartObjectControls::CheckTypes(const NMX::IStoreReader& access) const
+{
+  bool known = true;
+  const IResult visited = ForEachCluster(access, [&](const NMX::SmartCluster& cluster)
+                                         { known = known && m_layouts->Known(cluster.type); });
+  return visited.Failed() || known ? visited : EResult::NotFound;
+}
+
+IResult VSmartObjectControls::CheckPattern(const NMX::IStoreReader& access, const std::string& clusterType,
+                                           std::uint32_t pattern) const
+{
+  return pattern <= CurrentPatternSet(access, clusterType) ? EResult::Ok : EResult::InvalidValue;
+}
+
+}
