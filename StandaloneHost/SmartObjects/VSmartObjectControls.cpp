@@ -70,46 +70,49 @@ IResult ForEachCluster(const NMX::IStoreReader& access, Visit visit)
   return EResult::Ok;
 }
 
-/// Gives the clusters patterns of the present sets that no other cluster has, as long as there are any. False when one
-/// was left without.
-bool GiveFreePatterns(const NMX::IStoreReader& access, Clusters& clusters)
+/// Gives the clusters of new objects patterns of the present sets that no other cluster has. When there are too few,
+/// every cluster is given one of a larger set, if one serves them all.
+IResult GivePatterns(NMX::IEntryEditor& editor, const std::vector<TSubjectStoreId>& objects)
 {
   std::set<std::pair<std::string, std::uint32_t>> taken;
-  if (ForEachCluster(access, [&](const NMX::SmartCluster& cluster) { taken.emplace(cluster.type, cluster.pattern); })
-          .Failed())
-    return false;
-  bool all = true;
-  for (NMX::SmartCluster& cluster : clusters)
+  if (const IResult visited = ForEachCluster(editor, [&](const NMX::SmartCluster& cluster)
+                                             { taken.emplace(cluster.type, cluster.pattern); });
+      visited.Failed())
+    return visited;
+  bool enough = true;
+  for (const TSubjectStoreId id : objects)
   {
-    const std::uint32_t size = CurrentPatternSet(access, cluster.type);
-    std::uint32_t pattern = 1;
-    while (pattern <= size && taken.contains({cluster.type, pattern}))
-      ++pattern;
-    cluster.pattern = pattern <= size ? pattern : 0;
-    taken.emplace(cluster.type, cluster.pattern);
-    all = all && cluster.pattern != 0;
+    Clusters clusters;
+    if (const IResult read = NMX::Read(editor, id, NMX::Paths::SmartClusters(), clusters); read.Failed())
+      return read;
+    for (NMX::SmartCluster& cluster : clusters)
+    {
+      const std::uint32_t size = CurrentPatternSet(editor, cluster.type);
+      std::uint32_t pattern = 1;
+      while (pattern <= size && taken.contains({cluster.type, pattern}))
+        ++pattern;
+      enough = enough && pattern <= size;
+      if (pattern > size)
+        continue;
+      cluster.pattern = pattern;
+      taken.emplace(cluster.type, pattern);
+    }
+    if (const IResult set = editor.SetValue(id, NMX::Paths::SmartClusters(), std::move(clusters)); set.Failed())
+      return set;
   }
-  return all;
+  const IResult assigned = enough ? EResult::Ok : AssignPatterns(editor);
+  return assigned == EResult::NotSupported ? EResult::Ok : assigned; // then some stay without
 }
 
-/// Adds a smart object. Its clusters get patterns that are free, or else every cluster a pattern of a larger set, if
-/// there is one that serves them.
+/// Adds a smart object whose clusters have no patterns yet.
 IResult AddObject(NMX::IEntryEditor& editor, const std::string& name, Clusters clusters,
-                  std::vector<NMX::Position> additionalMarkers)
+                  std::vector<NMX::Position> additionalMarkers, TSubjectStoreId& id)
 {
-  const bool given = GiveFreePatterns(editor, clusters);
-  TSubjectStoreId id;
   if (const IResult added = editor.Add(ESubjectKind::SmartObjects, name, id); added.Failed())
     return added;
   if (const IResult set = editor.SetValue(id, NMX::Paths::SmartClusters(), std::move(clusters)); set.Failed())
     return set;
-  if (const IResult set = editor.SetValue(id, NMX::Paths::AdditionalMarkerPositions(), std::move(additionalMarkers));
-      set.Failed())
-    return set;
-  if (!given)
-    if (const IResult assigned = AssignPatterns(editor); assigned.Failed() && assigned != EResult::NotSupported)
-      return assigned;
-  return EResult::Ok;
+  return editor.SetValue(id, NMX::Paths::AdditionalMarkerPositions(), std::move(additionalMarkers));
 }
 
 /// Reads a template. `FileNotFound`, or `Failed` with the reason in the log.
@@ -180,9 +183,11 @@ IResult VSmartObjectControls::CreateFromTemplate(const std::string& name, const 
     const IResult added = editor->Add(ESubjectKind::SmartObjects, name, id);
     return added.Failed() ? added : read;
   }
-  if (const IResult added = AddObject(*editor, name, std::move(clusters), std::move(content->additionalMarkers));
+  if (const IResult added = AddObject(*editor, name, std::move(clusters), std::move(content->additionalMarkers), id);
       added.Failed())
     return added;
+  if (const IResult given = GivePatterns(*editor, {id}); given.Failed())
+    return given;
   return create == ECreate::Yes ? editor->Commit() : EResult::Ok;
 }
 
@@ -221,13 +226,17 @@ IResult VSmartObjectControls::CreateForUnlinkedDevices(std::vector<std::string>&
     return EResult::AllocationFailure;
 
   std::vector<std::string> made;
+  std::vector<TSubjectStoreId> objects;
   for (const Device& device : devices)
   {
     made.push_back(NameFor(*editor, device));
-    if (const IResult added = AddObject(*editor, made.back(), {{"Cluster", device.urn, 0, device.type}}, {});
+    if (const IResult added =
+            AddObject(*editor, made.back(), {{"Cluster", device.urn, 0, device.type}}, {}, objects.emplace_back());
         added.Failed())
       return added;
   }
+  if (const IResult given = GivePatterns(*editor, objects); given.Failed())
+    return given;
   const IResult kept = editor->Commit();
   if (kept.Succeeded())
     names = std::move(made);
