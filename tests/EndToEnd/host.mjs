@@ -65,26 +65,41 @@ function group(name, entries) {
   return content && `<${name}>${content}</${name}>`;
 }
 
-// Where in a subject its markers stand.
-function markersOf(kind, markers) {
-  const positions = markers.map(([x, y, z]) => `<Marker x="${x}" y="${y}" z="${z}"/>`).join('');
-  if (positions === '')
-    return '';
-  return kind === 'SmartObjects'
-    ? `<SmartObject><AdditionalMarkerPositions>${positions}</AdditionalMarkerPositions></SmartObject>`
-    : `<Markers>${positions}</Markers>`;
+// An empty element with these attributes.
+function leaf(name, attributes) {
+  return `<${name}${Object.entries(attributes).map(([key, value]) => ` ${key}="${escaped(value)}"`).join('')}/>`;
 }
 
-// The text of a subject configuration. A subject: { kind, name, parameters, warnings, markers }; the name is enough.
-export function configuration(subjects) {
-  const lines = subjects.map(({ kind = 'BasicObjects', name, parameters = {}, warnings = [], markers = [] }) => {
+// The content in an element; nothing when there is none.
+function within(name, content) {
+  return content && `<${name}>${content}</${name}>`;
+}
+
+// Where in a subject its markers and clusters stand.
+function partsOf(kind, markers, clusters) {
+  const positions = markers.map(([x, y, z]) => leaf('Marker', { x, y, z })).join('');
+  if (kind !== 'SmartObjects')
+    return within('Markers', positions);
+  const usual = { label: 'Cluster', pattern: 0, type: 'Corvex1' };
+  const made = clusters.map(cluster => leaf('SmartCluster', { ...usual, ...cluster }));
+  return within('SmartObject', within('AdditionalMarkerPositions', positions) + within('SmartClusters', made.join('')));
+}
+
+// The text of a subject configuration. A subject: { kind, name, parameters, warnings, markers, clusters }; the name is
+// enough. A cluster: { label, device, pattern, type }, of which each may be left out. A device: its attributes; the URN
+// is enough.
+export function configuration(subjects, devices = []) {
+  const lines = subjects.map(subject => {
+    const { kind = 'BasicObjects', name, parameters = {}, warnings = [], markers = [], clusters = [] } = subject;
     const content = group('Parameters', Object.entries(parameters)) +
                     group('Warnings', warnings.map(warning => [`Warning${warning}`, true])) +
-                    markersOf(kind, markers);
+                    partsOf(kind, markers, clusters);
     return `    <Subject kind="${kind}" name="${escaped(name)}">${content}</Subject>`;
   });
-  return ['<SubjectConfiguration version="1">', '  <Subjects>', ...lines, '  </Subjects>', '</SubjectConfiguration>',
-          ''].join('\n');
+  const usual = { type: 'Corvex1', connected: true, charging: false, battery: 50, radio: 11 };
+  const stage = devices.map(device => leaf('Device', { ...usual, ...device })).join('');
+  return [`<SubjectConfiguration version="1">${within('Devices', stage)}`, '  <Subjects>', ...lines, '  </Subjects>',
+          '</SubjectConfiguration>', ''].join('\n');
 }
 
 function launch(options) {
@@ -165,10 +180,12 @@ class Host {
   }
 }
 
-// Starts a host and waits until it serves calls. `subjects` or `config` (a text) fill an empty store.
-export async function startHost({ subjects, config, data = ':memory:', listen = '127.0.0.1:0', options = [] } = {}) {
+// Starts a host and waits until it serves calls. `subjects` with `devices`, or `config` (a text) fill an empty
+// store.
+export async function startHost({ subjects, devices, config, data = ':memory:', listen = '127.0.0.1:0',
+                                  options = [] } = {}) {
   const readyFile = join(temporaryDirectory(), 'ready.json');
-  const text = subjects ? configuration(subjects) : config;
+  const text = subjects ? configuration(subjects, devices) : config;
   const configurationOptions = text === undefined ? [] : ['--config', temporaryFile('stage.xml', text)];
   const process = launch(['--headless', '--listen', listen, '--data', data, '--ready-file', readyFile,
                           ...configurationOptions, ...options]);
