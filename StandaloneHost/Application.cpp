@@ -7,6 +7,7 @@
 #include "StandaloneHost/PluginModule.h"
 #include "StandaloneHost/Postal/VAsioPostalService.h"
 #include "StandaloneHost/Server/VServer.h"
+#include "StandaloneHost/Simulation/HostSimulation.h"
 #include "StandaloneHost/SmartObjects/AutoPatternManagement.h"
 #include "StandaloneHost/SmartObjects/VSmartObjectControls.h"
 #include "StandaloneHost/Store/SqliteArchive.h"
@@ -119,6 +120,7 @@ void RunApplication(const Options& options)
         options.features, HostSettings{std::make_shared<VFileLocations>(options.dataFolder), smartObjects, evaluation});
     VPluginHost host({store, postal, server, settings, layouts});
     (void)plugin->RegisterServices(host);
+    Simulation::RegisterGroup(*server, store, NMX::MakeShared<NotificationSystem::VAsioPostalServiceStrand>(postal));
     plugin->RegistrationFinished();
     patternManagement = SmartObjects::ManagePatterns(
         store, smartObjects, NMX::MakeShared<NotificationSystem::VAsioPostalServiceStrand>(postal));

@@ -1,19 +1,17 @@
 #pragma once
 
 #include "HostInterface/RunaCorePluginInterface/IDeviceLayoutRegistry.h"
-#include "StoreInterface/Value.h"
 
-#include <map>
 #include <mutex>
-#include <optional>
+#include <set>
 #include <string>
 #include <string_view>
-#include <vector>
 
 namespace SmartObjects
 {
 
-/// The types of device that the plugin has made known. [any]
+/// The types of device that the plugin has made known. Nothing in this host needs to know where their markers are.
+/// [any]
 class DeviceLayouts : public RunaCorePluginInterface::IDeviceLayoutRegistry
 {
 public:
@@ -23,7 +21,7 @@ public:
 
 private:
   mutable std::mutex m_mutex;
-  std::map<std::string, std::vector<NMX::Position>, std::less<>> m_markers; // mm, in the device's own frame
+  std::set<std::string, std::less<>> m_types;
 };
 
 }

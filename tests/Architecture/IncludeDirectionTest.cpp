@@ -41,12 +41,14 @@ const std::map<std::string, std::set<std::string>> allowed{
     {"StandaloneHost/Evaluation", {"HostInterface", "StoreInterface"}},
     {"StandaloneHost/Postal", {"HostInterface"}},
     {"StandaloneHost/Server", {"HostInterface"}},
+    {"StandaloneHost/Simulation", {"HostInterface", "StoreInterface"}},
     {"StandaloneHost/Files", {"StandaloneHost/Store", "HostInterface", "StoreInterface"}},
     {"StandaloneHost/SmartObjects",
      {"StandaloneHost/Files", "StandaloneHost/Store", "HostInterface", "StoreInterface"}},
     {"StandaloneHost",
      {"StandaloneHost/Store", "StandaloneHost/Postal", "StandaloneHost/Server", "StandaloneHost/Files",
-      "StandaloneHost/Evaluation", "StandaloneHost/SmartObjects", "HostInterface", "StoreInterface"}},
+      "StandaloneHost/Evaluation", "StandaloneHost/Simulation", "StandaloneHost/SmartObjects", "HostInterface",
+      "StoreInterface"}},
 };
 
 /// The folder of `allowed` that a file belongs to: the deepest that its path begins with.
