@@ -102,8 +102,36 @@ void EditOneEntry(benchmark::State& state)
   }
 }
 
+/// Disables and enables an object of a proximity group of ten, whose warnings depend on each other.
+void EditInAGroup(benchmark::State& state)
+{
+  const auto store = MakeStore(static_cast<int>(state.range(0)));
+  {
+    const auto editor = store->Editor();
+    for (int i = 0; i < static_cast<int>(state.range(0)); ++i)
+    {
+      NMX::TSubjectStoreId id;
+      (void)editor->FindByName(Name(i), id);
+      (void)editor->SetValue(id, NMX::Paths::ProximityGroupName(), "Group " + std::to_string(i / 10));
+      (void)editor->SetValue(id, NMX::Paths::TemplateGroupName(), std::string(i % 10 == 0 ? "" : "Template"));
+    }
+    (void)editor->Commit();
+  }
+  bool enabled = false;
+  for (auto _ : state)
+  {
+    const auto editor = store->Editor();
+    NMX::TSubjectStoreId id;
+    (void)editor->FindByName("Subject 50", id); // the one that tells the others apart
+    (void)editor->SetValue(id, NMX::Paths::Enabled(), enabled);
+    (void)editor->Commit();
+    enabled = !enabled;
+  }
+}
+
 }
 
 BENCHMARK(BareHashLookup);
 BENCHMARK(FindByNameAndRead);
 BENCHMARK(EditOneEntry)->Arg(100)->Arg(100000);
+BENCHMARK(EditInAGroup)->Arg(100)->Arg(100000);

@@ -42,9 +42,11 @@ struct Bits
   const Mask noProximityGroup = Of("TemplateGroupNoProximityGroup");
   const Mask nonIdentical = Of("TemplateGroupNonIdentical");
   const Mask processingNotEnabled = Of("TemplateGroupProcessingNotEnabled");
-  const Mask all = duplicateDevice | duplicatePattern | noPattern | disconnectedDevice | missingDevice |
-                   deviceNotLinked | activeMarkersOff | missingUnique | duplicateTemplates | noProximityGroup |
-                   nonIdentical | processingNotEnabled;
+  const Mask ofDevices = duplicateDevice | disconnectedDevice | missingDevice | deviceNotLinked | activeMarkersOff;
+  const Mask ofPatterns = duplicatePattern | noPattern;
+  const Mask ofProximityGroups = missingUnique | duplicateTemplates;
+  const Mask ofTemplateGroups = noProximityGroup | nonIdentical | processingNotEnabled;
+  const Mask all = ofDevices | ofPatterns | ofProximityGroups | ofTemplateGroups;
 
   static const Bits& Instance()
   {
@@ -90,62 +92,92 @@ public:
   void Run()
   {
     FindTouched();
-    for (const Id id : m_touched)
-      if (const SubjectRecord* record = m_draft.Find(id); record != nullptr)
+    for (const auto& [id, aspects] : m_touched)
+    {
+      const SubjectRecord* record = m_draft.Find(id);
+      if (record == nullptr)
+        continue;
+      std::uint64_t wanted = record->bits & m_bits.all;
+      const auto derive = [&](unsigned aspect, std::uint64_t bits, auto warnings)
       {
-        const std::uint64_t wanted = DeviceWarnings(*record) | PatternWarnings(*record) | GroupWarnings(*record);
-        if ((record->bits & m_bits.all) != wanted)
-        {
-          SubjectRecord& changed = m_draft.Change(id, NMX::EAspect::Warnings);
-          changed.bits = (changed.bits & ~m_bits.all) | wanted;
-        }
+        if ((aspects & aspect) != 0)
+          wanted = (wanted & ~bits) | (this->*warnings)(*record);
+      };
+      derive(Devices, m_bits.ofDevices, &Deriver::DeviceWarnings);
+      derive(Patterns, m_bits.ofPatterns, &Deriver::PatternWarnings);
+      derive(ProximityGroups, m_bits.ofProximityGroups, &Deriver::ProximityGroupWarnings);
+      derive(TemplateGroups, m_bits.ofTemplateGroups, &Deriver::TemplateGroupWarnings);
+      if ((record->bits & m_bits.all) != wanted)
+      {
+        SubjectRecord& changed = m_draft.Change(id, NMX::EAspect::Warnings);
+        changed.bits = (changed.bits & ~m_bits.all) | wanted;
       }
+    }
   }
 
 private:
+  /// What of an object may be others: its warnings of…
+  enum Aspect : unsigned
+  {
+    Devices = 1,
+    Patterns = 2,
+    ProximityGroups = 4,
+    TemplateGroups = 8,
+    All = 15
+  };
+
+  static unsigned AspectOf(const std::string& key)
+  {
+    switch (static_cast<ELink>(key.front()))
+    {
+    case ELink::Device:
+      return Devices;
+    case ELink::Pattern:
+      return Patterns;
+    case ELink::ProximityGroup:
+      return ProximityGroups;
+    case ELink::TemplateGroup:
+      return TemplateGroups;
+    }
+    return All;
+  }
+
   /// The objects that have a link as the edit leaves them.
   template <class Visit>
   void ForEachLinked(const std::string& key, Visit visit)
   {
-    const auto& before = m_draft.Base().Linked(key);
-    const auto visitIfLinked = [&](Id id)
-    {
-      const SubjectRecord* record = m_draft.Find(id);
-      if (record == nullptr)
-        return;
-      const auto links = LinksOf(*record);
-      if (std::binary_search(links.begin(), links.end(), key))
-        visit(*record);
-    };
-    for (const Id id : before)
-      visitIfLinked(id);
-    for (const Id id : m_changed)
-      if (!before.contains(id))
-        visitIfLinked(id);
+    for (const Id id : m_draft.Base().Linked(key))
+      if (!m_changed.contains(id))
+        visit(*m_draft.Base().Find(id));
+    if (const auto changed = m_changedLinks.find(key); changed != m_changedLinks.end())
+      for (const Id id : changed->second)
+        visit(*m_draft.Find(id));
   }
 
   void FindTouched()
   {
     std::set<std::string> keys;
-    const auto addKeys = [&](const SubjectRecord* record)
-    {
-      if (record != nullptr)
-        for (std::string& key : LinksOf(*record))
-          keys.insert(std::move(key));
-    };
     for (const auto& [id, change] : m_draft.Changes().subjects)
     {
       const SubjectRecord* before = m_draft.Base().Find(id);
       const SubjectRecord* now = change.record.get();
-      const SubjectRecord& either = now != nullptr ? *now : *before;
-      if (!IsObject(either))
+      if (!IsObject(now != nullptr ? *now : *before))
         continue;
       m_changed.insert(id);
-      if (before != nullptr && now != nullptr && !MayMatter(*before, *now))
+      const bool matters = before == nullptr || now == nullptr || MayMatter(*before, *now);
+      if (before != nullptr && matters)
+        for (std::string& key : LinksOf(*before))
+          keys.insert(std::move(key));
+      if (now == nullptr)
         continue;
-      m_touched.insert(id);
-      addKeys(before);
-      addKeys(now);
+      for (std::string& key : LinksOf(*now))
+      {
+        m_changedLinks[key].push_back(id);
+        if (matters)
+          keys.insert(std::move(key));
+      }
+      if (matters)
+        m_touched[id] = All;
     }
     bool all = false;
     for (const auto& [path, value] : m_draft.Changes().applicationEntries)
@@ -158,11 +190,11 @@ private:
       keys.insert(LinkKey(ELink::Device, text.substr(0, text.rfind('/'))));
     }
     for (const std::string& key : keys)
-      ForEachLinked(key, [&](const SubjectRecord& record) { m_touched.insert(record.id); });
+      ForEachLinked(key, [&](const SubjectRecord& record) { m_touched[record.id] |= AspectOf(key); });
     if (all)
       for (const NMX::ESubjectKind kind : {NMX::ESubjectKind::BasicObjects, NMX::ESubjectKind::SmartObjects})
         for (const Id id : m_draft.Subjects(kind))
-          m_touched.insert(id);
+          m_touched[id] |= TemplateGroups;
   }
 
   /// Whether a change of an object can change its warnings or another's.
@@ -225,26 +257,11 @@ private:
     return warnings;
   }
 
-  std::uint64_t GroupWarnings(const SubjectRecord& record)
+  std::uint64_t ProximityGroupWarnings(const SubjectRecord& record)
   {
-    if (!Enabled(record))
+    const std::string& group = ProximityGroup(record);
+    if (!Enabled(record) || group.empty())
       return 0;
-    std::uint64_t warnings = 0;
-    if (const std::string& group = ProximityGroup(record); !group.empty())
-      warnings |= ProximityGroupWarnings(group);
-    if (const std::string& group = TemplateGroup(record); !group.empty())
-    {
-      warnings |= TemplateGroupWarnings(group, record);
-      if (ProximityGroup(record).empty())
-        warnings |= m_bits.noProximityGroup;
-      if (!ProcessesTemplateGroups())
-        warnings |= m_bits.processingNotEnabled;
-    }
-    return warnings;
-  }
-
-  std::uint64_t ProximityGroupWarnings(const std::string& group)
-  {
     const auto [known, unknown] = m_proximityGroups.try_emplace(group, 0);
     if (!unknown)
       return known->second;
@@ -264,8 +281,11 @@ private:
     return known->second = (unique ? 0 : m_bits.missingUnique) | (duplicates ? m_bits.duplicateTemplates : 0);
   }
 
-  std::uint64_t TemplateGroupWarnings(const std::string& group, const SubjectRecord& record)
+  std::uint64_t TemplateGroupWarnings(const SubjectRecord& record)
   {
+    const std::string& group = TemplateGroup(record);
+    if (!Enabled(record) || group.empty())
+      return 0;
     const auto [known, unknown] = m_templateGroups.try_emplace(group, 0);
     if (unknown)
       ForEachLinked(LinkKey(ELink::TemplateGroup, group),
@@ -274,7 +294,8 @@ private:
                       if (Enabled(member) && !Identical(member, record))
                         known->second = m_bits.nonIdentical;
                     });
-    return known->second;
+    return known->second | (ProximityGroup(record).empty() ? m_bits.noProximityGroup : 0) |
+           (ProcessesTemplateGroups() ? 0 : m_bits.processingNotEnabled);
   }
 
   /// How many objects are linked to a device.
@@ -310,8 +331,9 @@ private:
 
   const Bits& m_bits = Bits::Instance();
   Draft& m_draft;
-  std::set<Id> m_changed; // objects that the edit changes
-  std::set<Id> m_touched; // objects whose warnings may be others
+  std::set<Id> m_changed;                                // objects that the edit changes
+  std::map<std::string, std::vector<Id>> m_changedLinks; // by their links as the edit leaves them
+  std::map<Id, unsigned> m_touched;                      // objects whose warnings may be others, and which of them
   std::map<std::string, std::uint64_t> m_proximityGroups;
   std::map<std::string, std::uint64_t> m_templateGroups;
   std::map<std::string, std::size_t> m_users;
