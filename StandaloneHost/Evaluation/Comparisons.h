@@ -66,8 +66,10 @@ public:
   void Review(Id object);
   void ReviewAll();
 
+  /// Forgets everything.
   void Clear();
 
+  /// Whether nothing is due.
   [[nodiscard]] bool Finished() const { return m_settled == m_objects.size(); }
 
   /// The layout of an object that takes part; null for others.
@@ -91,6 +93,7 @@ public:
   /// The distance of a match that is known, if there is one.
   [[nodiscard]] std::optional<double> Distance(Id first, Id second) const;
 
+  /// Whether TakeFindings would answer any.
   [[nodiscard]] bool HasFindings() const { return !m_findings.empty() || (Finished() && !m_whenDone.empty()); }
 
   /// What has become known since the last time. While comparisons are due, only what was lost with an object, or what

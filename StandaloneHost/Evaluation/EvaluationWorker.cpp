@@ -55,19 +55,24 @@ void EvaluationWorker::Run()
     try
     {
       Work();
+      return;
     }
     catch (const std::exception& failure)
     {
       NMX::Log(NMX::systemLog, NMX::ESeverity::Critical, "Object evaluation failed and starts anew: %1%",
                failure.what());
-      m_bell->Wait(Clock::now() + pauseAfterFailure, true);
-      const std::lock_guard lock(m_mutex);
-      m_comparisons.Clear();
-      m_known.clear();
-      m_looking = false;
-      m_reporting = false;
-      m_bell->Ring();
     }
+    catch (...)
+    {
+      NMX::Log(NMX::systemLog, NMX::ESeverity::Critical, "Object evaluation failed and starts anew.");
+    }
+    m_bell->Wait(Clock::now() + pauseAfterFailure, true);
+    const std::lock_guard lock(m_mutex);
+    m_comparisons.Clear();
+    m_known.clear();
+    m_looking = false;
+    m_reporting = false;
+    m_bell->Ring();
   }
 }
 

@@ -35,8 +35,9 @@ struct SearchLimits
 /// every match of more contains one of the threshold that is at least as close.
 ///
 /// Branch and bound: markers get counterparts one after the other, the one with the fewest candidates first. A marker's
-/// candidates keep the distances to the markers before it. Two bounds cut a branch off: the displacement that the pairs
-/// chosen so far leave, and one from all the distances that are still to come.
+/// candidates keep the distances to the markers before it. A branch is cut off when more markers have lost all of their
+/// candidates than the match may do without, or when the pairs chosen so far already leave too much displacement. One
+/// search at a time. [worker]
 class MatchSearch
 {
 public:

@@ -36,6 +36,10 @@ void AssignIfEnabled(const NMX::IStore& store, ISmartObjectControls& controls)
     NMX::Log(NMX::subjectStoreLog, NMX::ESeverity::Error, "Active marker patterns were not assigned: %1%",
              failure.what());
   }
+  catch (...)
+  {
+    NMX::Log(NMX::subjectStoreLog, NMX::ESeverity::Error, "Active marker patterns were not assigned.");
+  }
 }
 
 struct Management

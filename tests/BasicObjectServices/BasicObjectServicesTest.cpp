@@ -64,68 +64,6 @@ protected:
 
 }
 
-TEST_F(BasicObjectServicesTest, EveryOperationRefusesUnknownNamesAndOtherKinds)
-{
-  bool flag = true;
-  std::string text = "untouched";
-  std::map<NMX::IBasicObjectServices::EBasicObjectWarning, std::string> warnings;
-  const std::function<IResult(const std::string&)> operations[] = {
-      [&](auto& name) { return service->Remove(name); },
-      // A bad new name is only looked at once the object has been found.
-      [&](auto& name) { return service->Rename(name, " bad "); },
-      [&](auto& name) { return service->Enabled(name, flag); },
-      [&](auto& name) { return service->SetEnabled(name, false); },
-      [&](auto& name) { return service->Color(name, text); },
-      [&](auto& name) { return service->SetColor(name, "bad"); },
-      [&](auto& name) { return service->ProximityGroupName(name, text); },
-      [&](auto& name) { return service->SetProximityGroupName(name, "x"); },
-      [&](auto& name) { return service->TemplateGroupName(name, text); },
-      [&](auto& name) { return service->SetTemplateGroupName(name, "x"); },
-      [&](auto& name) { return service->AutoAssignEnabled(name, flag); },
-      [&](auto& name) { return service->SetAutoAssignEnabled(name, true); },
-      [&](auto& name) { return service->AutoAssignedName(name, text); },
-      [&](auto& name) { return service->BasicObjectWarnings(name, warnings); },
-  };
-  for (std::size_t i = 0; i < std::size(operations); ++i)
-  {
-    EXPECT_EQ(operations[i]("Nobody"), IResult(EResult::NotFound)) << i;
-    EXPECT_EQ(operations[i](""), IResult(EResult::NotFound)) << i;
-    EXPECT_EQ(operations[i]("Glove").Code(), 0x8000000FU) << i;
-    EXPECT_EQ(operations[i]("Ada").Code(), 0x8000000FU) << i;
-  }
-  EXPECT_TRUE(flag);
-  EXPECT_EQ(text, "untouched");
-}
-
-TEST_F(BasicObjectServicesTest, GettersAnswerWhatTheSettersSet)
-{
-  bool flag = true;
-  std::string text;
-  EXPECT_TRUE(service->SetEnabled("Crate", false).Succeeded());
-  EXPECT_TRUE(service->Enabled("Crate", flag).Succeeded());
-  EXPECT_FALSE(flag);
-  EXPECT_TRUE(service->SetAutoAssignEnabled("Crate", true).Succeeded());
-  EXPECT_TRUE(service->AutoAssignEnabled("Crate", flag).Succeeded());
-  EXPECT_TRUE(flag);
-  EXPECT_TRUE(service->SetColor("Crate", "#FF0000").Succeeded());
-  EXPECT_EQ(service->SetColor("Crate", "#ff000"), IResult(EResult::InvalidArgument));
-  EXPECT_TRUE(service->Color("Crate", text).Succeeded());
-  EXPECT_EQ(text, "#ffff0000");
-  EXPECT_TRUE(service->SetProximityGroupName("Crate", "Shelf").Succeeded());
-  EXPECT_TRUE(service->ProximityGroupName("Crate", text).Succeeded());
-  EXPECT_EQ(text, "Shelf");
-  EXPECT_TRUE(service->SetTemplateGroupName("Crate", "Crates").Succeeded());
-  EXPECT_TRUE(service->TemplateGroupName("Crate", text).Succeeded());
-  EXPECT_EQ(text, "Crates");
-  EXPECT_TRUE(service->ProximityGroupName("Sword", text).Succeeded());
-  EXPECT_EQ(text, "") << "an object in no group";
-
-  EXPECT_EQ(service->AutoAssignedName("Crate", text), IResult(EResult::NotSet));
-  Set(crate, Paths::AutoAssignedName(), std::string("LeftHand"));
-  EXPECT_TRUE(service->AutoAssignedName("Crate", text).Succeeded());
-  EXPECT_EQ(text, "LeftHand");
-}
-
 TEST_F(BasicObjectServicesTest, RenameChecksTheNewNameAndChangesNothingWhenItRefuses)
 {
   const struct

@@ -2,6 +2,11 @@
 
 import assert from 'node:assert/strict';
 import { readFileSync } from 'node:fs';
+import { setTimeout as sleep } from 'node:timers/promises';
+import { isDeepStrictEqual } from 'node:util';
+
+import { scaled, withHost } from './host.mjs';
+import { withConnection } from './wire.mjs';
 
 export const published = JSON.parse(readFileSync(new URL('../Catalogue/published-api.json', import.meta.url), 'utf8'));
 
@@ -79,4 +84,27 @@ export async function snapshot(connection) {
     objects[name] = answers.map(({ result, error }) => result ?? error);
   }
   return objects;
+}
+
+// The outputs of a call that succeeds, in their order.
+export async function outputsOf(connection, method, params) {
+  const answer = await connection.call(method, params);
+  assert.equal(answer.result?.code, codes.Ok, `${method} ${params}: ${JSON.stringify(answer)}`);
+  return Object.values(answer.result.outputs);
+}
+
+// Asks until the answer is what it should come to.
+export async function eventually(question, expected) {
+  const deadline = Date.now() + scaled(5000);
+  for (;;) {
+    const answer = await question();
+    if (isDeepStrictEqual(answer, expected) || Date.now() > deadline)
+      return assert.deepEqual(answer, expected);
+    await sleep(10);
+  }
+}
+
+// Runs `body` with a connection to a host with these subjects.
+export function withStage(subjects, body, options = {}) {
+  return withHost({ subjects, ...options }, host => withConnection(host, connection => body(connection, host)));
 }

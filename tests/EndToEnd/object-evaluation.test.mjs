@@ -6,19 +6,17 @@ import { test } from 'node:test';
 import { setTimeout as sleep } from 'node:timers/promises';
 import { isDeepStrictEqual } from 'node:util';
 
-import { assertFails, assertSucceeds, changed, codes, evaluationChanged, functions, inGroup } from './api.mjs';
-import { inTime, scaled, temporaryDirectory, withHost } from './host.mjs';
-import { withConnection } from './wire.mjs';
+import { assertFails, assertSucceeds, changed, codes, evaluationChanged, eventually, functions, inGroup, outputsOf, withStage }
+  from './api.mjs';
+import { inTime, scaled, temporaryDirectory } from './host.mjs';
 
 const group = 'ObjectEvaluationServices';
 const greatest = 1.7976931348623157e+308;
 const most = '18446744073709551615';
 
 // The outputs of a call that succeeds, in their order. A method without a group is one of this group.
-async function ask(connection, method, ...params) {
-  const answer = await connection.call(method.includes('.') ? method : `${group}.${method}`, params);
-  assert.equal(answer.result?.code, codes.Ok, `${method} ${params}: ${JSON.stringify(answer)}`);
-  return Object.values(answer.result.outputs);
+function ask(connection, method, ...params) {
+  return outputsOf(connection, method.includes('.') ? method : `${group}.${method}`, params);
 }
 
 function edit(connection, name, ...params) {
@@ -47,18 +45,6 @@ async function distance(connection, first, second) {
   return matches ? millimetres : null;
 }
 
-async function eventually(question, expected) {
-  const deadline = Date.now() + scaled(5000);
-  for (;;) {
-    const answer = await question();
-    if (isDeepStrictEqual(answer, expected))
-      return;
-    if (Date.now() > deadline)
-      assert.deepEqual(answer, expected);
-    await sleep(10);
-  }
-}
-
 function finished(connection, count) {
   return eventually(() => progress(connection), [count, count]);
 }
@@ -81,10 +67,6 @@ function exchange(connection, name, argument) {
 
 async function setMost(connection) {
   assertSucceeds(JSON.parse(await exchange(connection, 'SetMaximumEvaluationStepCount', most)));
-}
-
-function withStage(subjects, body, options = {}) {
-  return withHost({ subjects, ...options }, host => withConnection(host, connection => body(connection, host)));
 }
 
 // Markers as they are when the object lies elsewhere, and the other way round.
@@ -144,6 +126,7 @@ test('Settings have defaults, take what is fit, and tell of every change', () =>
 test('What cannot be answered is refused, and why is asked in this order', () => withStage([
   ...twins, { name: 'Dark', parameters: { Enabled: false }, markers: odd },
   { name: 'Hedge', markers: Array.from({ length: 65 }, (_, i) => [i * 50, i * i, 0]) },
+  { name: 'Far', markers: [[0, 0, 0], [1, 0, 0], [0, 1, 0], [1e300, -1e300, greatest]] },
   { kind: 'SmartObjects', name: 'Handset', markers: other }, { kind: 'CFCs', name: 'Actor' },
   { kind: 'Props', name: 'Chair' }], async connection => {
   const refuses = async (code, name, ...params) =>
@@ -164,7 +147,8 @@ test('What cannot be answered is refused, and why is asked in this order', () =>
   await refusesNames();
   for (const pair of [['Dark', 'Crate'], ['Crate', 'Dark'], ['Dark', 'Dark'], ['Dark', 'Hedge'], ['Hedge', 'Dark']])
     await refuses('NotRequired', 'MatchDistance', ...pair);
-  for (const pair of [['Hedge', 'Crate'], ['Crate', 'Hedge'], ['Hedge', 'Hedge']])
+  for (const pair of [['Hedge', 'Crate'], ['Crate', 'Hedge'], ['Hedge', 'Hedge'],
+                      ['Far', 'Crate'], ['Crate', 'Far']])
     await refuses('NotSupported', 'MatchDistance', ...pair);
   const strangers = { SecondObjectName: 'Crate', FirstObjectName: 'Handset' };
   const answer = await connection.call(`${group}.MatchDistance`, strangers);

@@ -6,11 +6,10 @@ import { truncateSync } from 'node:fs';
 import { join } from 'node:path';
 import { describe, test } from 'node:test';
 import { setTimeout as sleep } from 'node:timers/promises';
-import { isDeepStrictEqual } from 'node:util';
 
-import { assertFails, assertSucceeds, codes, functions as allFunctions, inGroup, inputs, published } from './api.mjs';
-import { inTime, scaled, temporaryDirectory, temporaryFile, withHost } from './host.mjs';
-import { withConnection } from './wire.mjs';
+import { assertFails, assertSucceeds, codes, eventually, functions as allFunctions, inGroup, inputs, outputsOf, published,
+         withStage } from './api.mjs';
+import { inTime, scaled, temporaryDirectory, temporaryFile } from './host.mjs';
 
 const group = 'SmartObjectServices';
 const changed = `${group}.SmartObjectChangedCallback`;
@@ -22,10 +21,8 @@ function named(name) {
 }
 
 // The outputs of a call that succeeds, in their order. A method without a group is one of this group.
-async function ask(connection, method, ...params) {
-  const answer = await connection.call(named(method), params);
-  assert.equal(answer.result?.code, codes.Ok, `${method} ${params}: ${JSON.stringify(answer)}`);
-  return Object.values(answer.result.outputs);
+function ask(connection, method, ...params) {
+  return outputsOf(connection, named(method), params);
 }
 
 // What cannot be read as a number at all is refused with a detail besides.
@@ -38,10 +35,6 @@ async function refuses(connection, code, method, ...params) {
 
 function smart(name, ...clusters) {
   return { kind: 'SmartObjects', name, clusters };
-}
-
-function withStage(subjects, body, options = {}) {
-  return withHost({ subjects, ...options }, host => withConnection(host, connection => body(connection, host)));
 }
 
 async function list(connection) {
@@ -61,16 +54,6 @@ async function patterns(connection, names) {
 
 function upTo(count) {
   return Array.from({ length: count }, (_, i) => i + 1);
-}
-
-async function eventually(question, expected) {
-  const deadline = Date.now() + scaled(3000);
-  for (;;) {
-    const answer = await question();
-    if (isDeepStrictEqual(answer, expected) || Date.now() > deadline)
-      return assert.deepEqual(answer, expected);
-    await sleep(10);
-  }
 }
 
 // How many notifications come of what the body does. A query after an edit is answered on the way on which the edit's

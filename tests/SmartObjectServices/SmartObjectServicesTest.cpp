@@ -66,45 +66,6 @@ protected:
 
 }
 
-TEST_F(SmartObjectServicesTest, EveryOperationRefusesUnknownNamesAndOtherKinds)
-{
-  bool flag = true;
-  std::uint32_t number = 7;
-  std::string text = "untouched";
-  std::map<NMX::ISmartObjectServices::ESmartObjectWarning, std::string> warnings;
-  const std::function<IResult(const std::string&)> operations[] = {
-      [&](auto& name) { return service->Remove(name); },
-      [&](auto& name) { return service->Rename(name, " bad "); },
-      [&](auto& name) { return service->SmartClusterCount(name, number); },
-      [&](auto& name) { return service->SmartClusterLabel(name, 9, text); },
-      [&](auto& name) { return service->SetSmartClusterLabel(name, 9, "x"); },
-      [&](auto& name) { return service->SmartClusterActiveMarkerPattern(name, 9, number); },
-      [&](auto& name) { return service->SetSmartClusterActiveMarkerPattern(name, 9, 1); },
-      [&](auto& name) { return service->SmartClusterDeviceURN(name, 9, text); },
-      [&](auto& name) { return service->SetSmartClusterDeviceURN(name, 9, "x"); },
-      [&](auto& name) { return service->Enabled(name, flag); },
-      [&](auto& name) { return service->SetEnabled(name, false); },
-      [&](auto& name) { return service->Color(name, text); },
-      [&](auto& name) { return service->SetColor(name, "bad"); },
-      [&](auto& name) { return service->ActiveMarkersOnWhileCharging(name, flag); },
-      [&](auto& name) { return service->SetActiveMarkersOnWhileCharging(name, true); },
-      [&](auto& name) { return service->ProximityGroupName(name, text); },
-      [&](auto& name) { return service->SetTemplateGroupName(name, "x"); },
-      [&](auto& name) { return service->AutoAssignEnabled(name, flag); },
-      [&](auto& name) { return service->AutoAssignedName(name, text); },
-      [&](auto& name) { return service->SmartObjectWarnings(name, warnings); },
-  };
-  for (std::size_t i = 0; i < std::size(operations); ++i)
-  {
-    EXPECT_EQ(operations[i]("Nobody"), IResult(EResult::NotFound)) << i;
-    EXPECT_EQ(operations[i]("Crate").Code(), 0x8000000FU) << i;
-    EXPECT_EQ(operations[i]("Ada").Code(), 0x8000000FU) << i;
-  }
-  EXPECT_TRUE(flag);
-  EXPECT_EQ(number, 7U);
-  EXPECT_EQ(text, "untouched");
-}
-
 TEST_F(SmartObjectServicesTest, ClustersAreReadAndWrittenByTheirIndex)
 {
   std::uint32_t number = 0;

@@ -219,61 +219,6 @@ TEST_F(ObjectEvaluationEngineTest, SettingsThatMakeNoSenseAreRefusedAndThoseThat
   EXPECT_FALSE(enabled);
 }
 
-TEST_F(ObjectEvaluationEngineTest, ThresholdAndStepsDecideWhatIsFoundAndWarnedOf)
-{
-  const Id square = Add("Square", {{0, 0, 0}, {200, 0, 0}, {200, 150, 0}, {0, 150, 90}});
-  const Id lifted = Add("Lifted", {{0, 0, 12}, {200, 0, 0}, {200, 150, 0}, {0, 150, 90}});
-  EXPECT_TRUE(engine->SetEnabled(true).Succeeded());
-  ASSERT_TRUE(Eventually([&] { return Progress() == std::pair(4UL, 4UL); }));
-  const double distance = Distance(square, lifted);
-  ASSERT_GT(distance, 1);
-  ASSERT_LT(distance, 10);
-  for (const auto& [threshold, warning] : {std::pair(distance * 2.01, "likely"),
-                                           {distance * 1.99, "possible"},
-                                           {distance * 1.01, "possible"},
-                                           {distance, "-"},
-                                           {1e300, "likely"},
-                                           {0.0, "-"}})
-  {
-    EXPECT_TRUE(engine->SetWarningThreshold(threshold).Succeeded());
-    EXPECT_TRUE(EventuallyWarns(lifted, warning)) << threshold << ": " << Warning(lifted);
-  }
-
-  std::uint64_t steps = 0;
-  EXPECT_TRUE(engine->SetMaximumEvaluationStepCount(2).Succeeded());
-  EXPECT_TRUE(Eventually([&] { return engine->HighestStepCountReached(steps).Succeeded() && steps == 2; }));
-  EXPECT_TRUE(Eventually([&] { return Progress() == std::pair(4UL, 4UL); }));
-  EXPECT_EQ(Distance(square, lifted), none);
-  EXPECT_TRUE(engine->SetMaximumEvaluationStepCount(1000).Succeeded());
-  EXPECT_TRUE(Eventually([&] { return Distance(square, lifted) == distance; }));
-}
-
-TEST_F(ObjectEvaluationEngineTest, AnswersRefusalsInTheirOrder)
-{
-  const Id crate = Add("Crate", Shape(1));
-  const Id huge = Add("Huge", Shape(2, 65));
-  const Id far = Add("Far", {{0, 0, 0}, {1, 0, 0}, {0, 1, 0}, {1e300, -1e300, std::numeric_limits<double>::max()}});
-  std::uint64_t count = 0;
-  bool matches = true;
-  double distance = 1;
-  const auto ask = [&](Id first, Id second)
-  { return engine->MatchDistance(*store->Reader(), first, second, matches, distance); };
-  EXPECT_EQ(engine->Progress(count, count), IResult(EResult::NotAvailable));
-  EXPECT_EQ(engine->HighestStepCountReached(count), IResult(EResult::NotAvailable));
-  EXPECT_EQ(ask(Id(99), crate), IResult(EResult::NotAvailable));
-  EXPECT_TRUE(engine->SetEnabled(true).Succeeded());
-  EXPECT_EQ(ask(crate, Id(99)), IResult(EResult::NotFound));
-  EXPECT_TRUE(Eventually([&] { return ask(crate, huge) == IResult(EResult::NotSupported); }));
-  matches = true;
-  distance = 1;
-  EXPECT_EQ(ask(far, crate), IResult(EResult::NotSupported));
-  EXPECT_TRUE(Set(huge, Paths::Enabled(), false).Succeeded());
-  EXPECT_EQ(ask(crate, huge), IResult(EResult::NotRequired));
-  EXPECT_EQ(ask(huge, crate), IResult(EResult::NotRequired));
-  EXPECT_TRUE(matches);
-  EXPECT_EQ(distance, 1);
-}
-
 TEST_F(ObjectEvaluationEngineTest, SwitchingItOffClearsWarningsInTheSameEditAndOnAgainBringsThemBack)
 {
   const Id one = Add("One", Shape(1));
