@@ -2,6 +2,7 @@
 
 #include "HostInterface/NMX/GlobalLog.h"
 #include "HostInterface/NotificationSystem/VAsioPostalServiceStrand.h"
+#include "StandaloneHost/Characters/VCharacterControls.h"
 #include "StandaloneHost/Evaluation/VObjectEvaluationEngine.h"
 #include "StandaloneHost/Files/SubjectConfiguration.h"
 #include "StandaloneHost/PluginModule.h"
@@ -26,14 +27,16 @@ namespace
 
 std::shared_ptr<Store::VStore> OpenStore(const Options& options)
 {
+  const Store::DerivationRules rules{(options.features & RunaCorePluginInterface::Feature::objectAutoAssign) != 0};
   if (!options.dataFolder)
-    return NMX::MakeShared<Store::VStore>();
+    return NMX::MakeShared<Store::VStore>(rules);
   std::error_code error;
   std::filesystem::create_directories(*options.dataFolder, error);
   if (error)
     throw Store::ArchiveError("cannot use the data folder \"" + options.dataFolder->string() +
                               "\": " + error.message());
-  return NMX::MakeShared<Store::VStore>(std::make_unique<Store::SqliteArchive>(*options.dataFolder / "store.sqlite"));
+  return NMX::MakeShared<Store::VStore>(std::make_unique<Store::SqliteArchive>(*options.dataFolder / "store.sqlite"),
+                                        rules);
 }
 
 void LoadConfigurations(Store::VStore& store, const Options& options)
@@ -88,11 +91,12 @@ std::shared_ptr<Evaluation::VObjectEvaluationEngine> StartEvaluation(const std::
 }
 
 /// The order matters: clients go first, then what serves them, then the plugin, and the store last.
-void Stop(Server::VServer& server, Postal::VAsioPostalService& postal, Evaluation::VObjectEvaluationEngine* evaluation,
-          PluginPointer plugin, std::shared_ptr<Store::VStore> store)
+void Stop(Server::VServer& server, Characters::VCharacterControls& characters, Postal::VAsioPostalService& postal,
+          Evaluation::VObjectEvaluationEngine* evaluation, PluginPointer plugin, std::shared_ptr<Store::VStore> store)
 {
-  server.Close(); // no client, no outstanding call, no function any more
-  postal.Stop();  // the strands have run empty
+  server.Close();    // no client, no outstanding call, no function any more
+  characters.Stop(); // the timers that would keep the postal service busy are gone
+  postal.Stop();     // the strands have run empty
   if (evaluation != nullptr)
     evaluation->Stop(); // nobody edits the store any more
   plugin->UnregisterQml();
@@ -113,11 +117,14 @@ void RunApplication(const Options& options)
   const auto evaluation = StartEvaluation(store, options);
   const auto layouts = std::make_shared<SmartObjects::DeviceLayouts>();
   const auto smartObjects = std::make_shared<SmartObjects::VSmartObjectControls>(store, layouts);
+  const auto characters =
+      std::make_shared<Characters::VCharacterControls>(store, postal, options.characterCalibrationTime);
   std::shared_ptr<const void> patternManagement;
   try
   {
     const auto settings = std::make_shared<VPluginSettings>(
-        options.features, HostSettings{std::make_shared<VFileLocations>(options.dataFolder), smartObjects, evaluation});
+        options.features,
+        HostSettings{std::make_shared<VFileLocations>(options.dataFolder), smartObjects, evaluation, characters});
     VPluginHost host({store, postal, server, settings, layouts});
     (void)plugin->RegisterServices(host);
     Simulation::RegisterGroup(*server, store, NMX::MakeShared<NotificationSystem::VAsioPostalServiceStrand>(postal));
@@ -132,8 +139,8 @@ void RunApplication(const Options& options)
   }
   catch (...)
   {
-    Stop(*server, *postal, evaluation.get(), std::move(plugin), std::move(store));
+    Stop(*server, *characters, *postal, evaluation.get(), std::move(plugin), std::move(store));
     throw;
   }
-  Stop(*server, *postal, evaluation.get(), std::move(plugin), std::move(store));
+  Stop(*server, *characters, *postal, evaluation.get(), std::move(plugin), std::move(store));
 }

@@ -116,10 +116,12 @@ po::options_description Description()
        "folder in which the store is kept, or :memory: to keep nothing (default: the user's data folder)") //
       ("listen", text("127.0.0.1:8420"), "ADDRESS:PORT to serve; port 0 takes a free one")                 //
       ("token-file", po::value<std::string>(),
-       "clients must present the token in this file; required unless the address is loopback")     //
-      ("allow-origin", texts(), "origin of a web page that may connect (repeatable)")              //
-      ("features", text("0xFFFFFFFF"), "feature mask, decimal or 0x...")                           //
-      ("level", text("2"), "2, or 1 to open the preview functions as well")                        //
+       "clients must present the token in this file; required unless the address is loopback") //
+      ("allow-origin", texts(), "origin of a web page that may connect (repeatable)")          //
+      ("features", text("0xFFFFFFFF"), "feature mask, decimal or 0x...")                       //
+      ("level", text("2"), "2, or 1 to open the preview functions as well")                    //
+      ("character-calibration-time", text("3000"),
+       "how long the calibration of a character takes, in ms")                                     //
       ("headless", "no window")                                                                    //
       ("ready-file", po::value<std::string>(), "file to write once calls are served")              //
       ("plugin-file", po::value<std::string>(), "plugin module to load (default: the host's own)") //
@@ -183,6 +185,8 @@ Request ReadOptions(int argumentCount, const char* const* arguments)
   options.server.grantedLevel = ParseNumber<std::uint32_t>(given("level"), "level");
   if (options.server.grantedLevel != 1 && options.server.grantedLevel != 2)
     throw OptionError("--level: expected 1 or 2, got " + Quoted(given("level")));
+  options.characterCalibrationTime = std::chrono::milliseconds(
+      ParseNumber<std::uint32_t>(given("character-calibration-time"), "character-calibration-time"));
   options.headless = values.count("headless") != 0;
   options.readyFile = given("ready-file");
   options.pluginFile = given("plugin-file");

@@ -3,6 +3,7 @@
 #include "HostInterface/NMX/GlobalLog.h"
 #include "StandaloneHost/Server/VServer.h"
 
+#include <chrono>
 #include <cstdint>
 #include <filesystem>
 #include <optional>
@@ -24,6 +25,7 @@ struct Options
   std::optional<std::filesystem::path> dataFolder;   ///< none: nothing is kept
   Server::ServerOptions server;
   std::uint32_t features = 0xFFFFFFFF;
+  std::chrono::milliseconds characterCalibrationTime{3000};
   bool headless = false;
   std::filesystem::path readyFile;  ///< empty: none
   std::filesystem::path pluginFile; ///< empty: the one that was built with the host

@@ -131,9 +131,9 @@ void VPluginSettings::ObjectEvaluationSettings(std::shared_ptr<IObjectEvaluation
   settings = m_settings.objectEvaluation;
 }
 
-void VPluginSettings::CharacterSettings(std::shared_ptr<ICharacterSettings>& settings) const
+void VPluginSettings::CharacterControls(std::shared_ptr<ICharacterControls>& controls) const
 {
-  settings.reset();
+  controls = m_settings.characters;
 }
 
 void VPluginSettings::CalibrationSettings(std::shared_ptr<ICalibrationSettings>& settings) const

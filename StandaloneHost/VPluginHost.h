@@ -49,6 +49,7 @@ struct HostSettings
   std::shared_ptr<IFileLocations> fileLocations;
   std::shared_ptr<ISmartObjectControls> smartObjects;
   std::shared_ptr<RunaCorePluginInterface::IObjectEvaluationSettings> objectEvaluation;
+  std::shared_ptr<ICharacterControls> characters;
 };
 
 /// The host's settings object: the feature mask of the command line, and what the services are configured with.
@@ -63,7 +64,7 @@ public:
   void RigidObjectControls(std::shared_ptr<IRigidObjectControls>& controls) const override;
   void ObjectEvaluationSettings(
       std::shared_ptr<RunaCorePluginInterface::IObjectEvaluationSettings>& settings) const override;
-  void CharacterSettings(std::shared_ptr<RunaCorePluginInterface::ICharacterSettings>& settings) const override;
+  void CharacterControls(std::shared_ptr<ICharacterControls>& controls) const override;
   void CalibrationSettings(std::shared_ptr<RunaCorePluginInterface::ICalibrationSettings>& settings) const override;
 
 private:

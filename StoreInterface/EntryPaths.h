@@ -170,6 +170,22 @@ template <PathText path>
 {
   return PathConstant<"Warnings/WarningCFCChildWarning">();
 }
+[[nodiscard]] inline EntryPath WarningCFCNoReferenceClusterAssigned()
+{
+  return PathConstant<"Warnings/WarningCFCNoReferenceClusterAssigned">();
+}
+[[nodiscard]] inline EntryPath WarningEmptySlot()
+{
+  return PathConstant<"Warnings/WarningEmptySlot">();
+}
+[[nodiscard]] inline EntryPath WarningInsufficientAutoAssignCandidates()
+{
+  return PathConstant<"Warnings/WarningInsufficientAutoAssignCandidates">();
+}
+[[nodiscard]] inline EntryPath WarningNotCalibrated()
+{
+  return PathConstant<"Warnings/WarningNotCalibrated">();
+}
 [[nodiscard]] inline EntryPath WarningObjectConfusion()
 {
   return PathConstant<"Warnings/WarningObjectConfusion">();

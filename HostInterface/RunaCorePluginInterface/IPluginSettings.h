@@ -3,6 +3,7 @@
 #include <cstdint>
 #include <memory>
 
+class ICharacterControls;
 class IFileLocations;
 class ISmartObjectControls;
 class IRigidObjectControls;
@@ -11,7 +12,6 @@ namespace RunaCorePluginInterface
 {
 
 class IObjectEvaluationSettings;
-class ICharacterSettings;
 class ICalibrationSettings;
 
 /// Bits of the feature mask.
@@ -49,7 +49,7 @@ public:
   virtual void SmartObjectControls(std::shared_ptr<ISmartObjectControls>& controls) const = 0;
   virtual void RigidObjectControls(std::shared_ptr<IRigidObjectControls>& controls) const = 0;
   virtual void ObjectEvaluationSettings(std::shared_ptr<IObjectEvaluationSettings>& settings) const = 0;
-  virtual void CharacterSettings(std::shared_ptr<ICharacterSettings>& settings) const = 0;
+  virtual void CharacterControls(std::shared_ptr<ICharacterControls>& controls) const = 0;
   virtual void CalibrationSettings(std::shared_ptr<ICalibrationSettings>& settings) const = 0;
 };
 

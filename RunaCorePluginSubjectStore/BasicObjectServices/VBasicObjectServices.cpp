@@ -11,7 +11,7 @@ namespace BasicObjectServices
 using NMX::IResult;
 
 VBasicObjectServices::VBasicObjectServices(std::shared_ptr<NMX::IStore> store)
-    : ObjectServices(std::move(store), NMX::ESubjectKind::BasicObjects, Subjects::IsBasicObject)
+    : ObjectServices(std::move(store), NMX::ESubjectKind::BasicObjects, Subjects::MustBeBasicObject)
 {
 }
 

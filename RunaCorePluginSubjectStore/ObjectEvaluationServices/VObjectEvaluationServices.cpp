@@ -24,7 +24,7 @@ IResult Ask(Engine& engine, Operation operation, Arguments&... arguments) noexce
 
 IResult FindObject(const NMX::IStoreReader& reader, const std::string& name, NMX::TSubjectStoreId& id)
 {
-  const IResult found = Subjects::FindSubject(reader, name, Subjects::IsObject, id);
+  const IResult found = Subjects::FindSubject(reader, name, Subjects::MustBeObject, id);
   return found == EResult::NotFound ? EResult::InvalidArgument : found;
 }
 

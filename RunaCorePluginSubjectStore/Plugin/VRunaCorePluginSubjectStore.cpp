@@ -6,6 +6,7 @@
 #include "HostInterface/RunaCorePluginInterface/IPluginSettings.h"
 #include "HostInterface/TerminalServer2/IServer.h"
 #include "RunaCorePluginSubjectStore/Catalogue/BasicObjectCatalogue.h"
+#include "RunaCorePluginSubjectStore/Catalogue/CharacterFromClustersCatalogue.h"
 #include "RunaCorePluginSubjectStore/Catalogue/ObjectEvaluationCatalogue.h"
 #include "RunaCorePluginSubjectStore/Catalogue/SmartObjectCatalogue.h"
 #include "RunaCorePluginSubjectStore/SmartObjectServices/DeviceTypes.h"
@@ -95,6 +96,15 @@ bool VRunaCorePluginSubjectStore::RegisterServices(IPluginHost& host)
     auto service = ObjectEvaluationServices::VObjectEvaluationServices::Make(Store(host), std::move(evaluation));
     Publish<NMX::IObjectEvaluationServices>(host, Catalogue::ObjectEvaluationGroup(), service);
     m_objectEvaluationServices = std::move(service);
+  }
+  if ((FeatureMask(host) & (Feature::characters | Feature::markerless)) != 0)
+  {
+    std::shared_ptr<ICharacterControls> controls;
+    Settings(host)->CharacterControls(controls);
+    auto service = NMX::MakeShared<CharacterFromClustersServices::VCharacterFromClustersServices>(std::move(controls),
+                                                                                                  Store(host));
+    Publish<NMX::ICharacterFromClustersServices>(host, Catalogue::CharacterFromClustersGroup(), service);
+    m_characterFromClustersServices = std::move(service);
   }
   return true;
 }

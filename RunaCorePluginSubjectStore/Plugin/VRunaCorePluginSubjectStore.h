@@ -2,6 +2,7 @@
 
 #include "HostInterface/RunaCorePluginInterface/IPlugin.h"
 #include "RunaCorePluginSubjectStore/BasicObjectServices/VBasicObjectServices.h"
+#include "RunaCorePluginSubjectStore/CharacterFromClustersServices/VCharacterFromClustersServices.h"
 #include "RunaCorePluginSubjectStore/ObjectEvaluationServices/VObjectEvaluationServices.h"
 #include "RunaCorePluginSubjectStore/SmartObjectServices/VSmartObjectServices.h"
 
@@ -23,4 +24,5 @@ private:
   std::shared_ptr<BasicObjectServices::VBasicObjectServices> m_basicObjectServices;
   std::shared_ptr<ObjectEvaluationServices::VObjectEvaluationServices> m_objectEvaluationServices;
   std::shared_ptr<SmartObjectServices::VSmartObjectServices> m_smartObjectServices;
+  std::shared_ptr<CharacterFromClustersServices::VCharacterFromClustersServices> m_characterFromClustersServices;
 };

@@ -115,8 +115,8 @@ public:
   virtual IResult AutoAssignEnabled(const std::string& name, bool& enabled) const = 0;
   virtual IResult SetAutoAssignEnabled(const std::string& name, bool enabled) = 0;
 
-  /// The name of the character slot that the object was assigned to, under which it is output. `NotSet` while it is
-  /// not assigned.
+  /// The name of the character slot that the object is in, under which it is output then; empty unless it is in one
+  /// and auto-assign is enabled for it.
   virtual IResult AutoAssignedName(const std::string& name, std::string& autoAssignedName) const = 0;
 
   /// The warnings that hold, each with its text.

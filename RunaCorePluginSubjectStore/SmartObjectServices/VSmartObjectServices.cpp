@@ -27,7 +27,7 @@ using Clusters = std::vector<NMX::SmartCluster>;
 VSmartObjectServices::VSmartObjectServices(std::shared_ptr<NMX::IStore> store,
                                            std::shared_ptr<ISmartObjectControls> controls,
                                            std::shared_ptr<IFileLocations> locations)
-    : ObjectServices(std::move(store), NMX::ESubjectKind::SmartObjects, Subjects::IsSmartObject),
+    : ObjectServices(std::move(store), NMX::ESubjectKind::SmartObjects, Subjects::MustBeSmartObject),
       m_controls(std::move(controls)), m_locations(std::move(locations))
 {
 }

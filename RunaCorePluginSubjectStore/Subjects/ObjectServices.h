@@ -37,7 +37,7 @@ public:
 
 protected:
   /// Serves the subjects of `kind`; of those found by name, the ones that `rule` accepts.
-  ObjectServices(std::shared_ptr<NMX::IStore> store, NMX::ESubjectKind kind, KindRule rule)
+  ObjectServices(std::shared_ptr<NMX::IStore> store, NMX::ESubjectKind kind, SubjectRule rule)
       : m_store(std::move(store)), m_kind(kind), m_rule(rule)
   {
   }
@@ -49,14 +49,14 @@ protected:
   }
 
   [[nodiscard]] NMX::IStore& Store() const { return *m_store; }
-  [[nodiscard]] KindRule Rule() const { return m_rule; }
+  [[nodiscard]] SubjectRule Rule() const { return m_rule; }
   /// Raised whenever one is added, removed or changed.
   [[nodiscard]] std::shared_ptr<NMX::IStore::ChangeCallback> Changed() { return m_store->SubjectsChanged(m_kind); }
 
 private:
   const std::shared_ptr<NMX::IStore> m_store;
   const NMX::ESubjectKind m_kind;
-  const KindRule m_rule;
+  const SubjectRule m_rule;
 };
 
 template <class Interface>

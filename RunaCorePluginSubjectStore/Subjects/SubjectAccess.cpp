@@ -10,14 +10,54 @@ namespace Subjects
 using NMX::EResult;
 using NMX::IResult;
 
-IResult FindSubject(const NMX::IStoreReader& access, std::string_view name, KindRule rule, NMX::TSubjectStoreId& id)
+namespace
 {
-  if (const IResult found = access.FindByName(name, id); found.Failed())
-    return found;
+
+IResult CheckObjectKind(const NMX::IStoreReader& access, NMX::TSubjectStoreId id, bool (*accepts)(std::uint32_t))
+{
   std::uint32_t objectKind = 0;
   if (const IResult asked = access.ObjectKind(id, objectKind); asked.Failed())
     return asked;
-  return rule(objectKind) ? EResult::Ok : EResult::InvalidArgument;
+  return accepts(objectKind) ? EResult::Ok : EResult::InvalidArgument;
+}
+
+}
+
+IResult MustBeBasicObject(const NMX::IStoreReader& access, NMX::TSubjectStoreId id)
+{
+  return CheckObjectKind(access, id, [](std::uint32_t objectKind)
+                         { return (objectKind & NMX::SubjectFlag::objectKindMask) == NMX::SubjectFlag::rigid; });
+}
+
+IResult MustBeSmartObject(const NMX::IStoreReader& access, NMX::TSubjectStoreId id)
+{
+  return CheckObjectKind(access, id,
+                         [](std::uint32_t objectKind) { return (objectKind & NMX::SubjectFlag::smart) != 0; });
+}
+
+IResult MustBeObject(const NMX::IStoreReader& access, NMX::TSubjectStoreId id)
+{
+  return CheckObjectKind(access, id,
+                         [](std::uint32_t objectKind) { return (objectKind & NMX::SubjectFlag::objectKindMask) != 0; });
+}
+
+IResult MustBeCharacter(const NMX::IStoreReader& access, NMX::TSubjectStoreId id)
+{
+  NMX::ESubjectKind kind{};
+  if (const IResult asked = access.Kind(id, kind); asked.Failed())
+    return asked;
+  return kind == NMX::ESubjectKind::CharactersFromClusters ? EResult::Ok : EResult::NotSupported;
+}
+
+IResult FindSubject(const NMX::IStoreReader& access, std::string_view name, SubjectRule rule, NMX::TSubjectStoreId& id)
+{
+  NMX::TSubjectStoreId found;
+  if (const IResult sought = access.FindByName(name, found); sought.Failed())
+    return sought;
+  if (const IResult accepted = rule(access, found); accepted.Failed())
+    return accepted;
+  id = found;
+  return EResult::Ok;
 }
 
 IResult ReportException() noexcept

@@ -16,26 +16,19 @@
 namespace Subjects
 {
 
-/// Which subjects a service accepts, told by the store's object-kind answer.
-using KindRule = bool (*)(std::uint32_t objectKind);
+/// Which subjects a service accepts: `Ok`, or why it does not accept this one.
+using SubjectRule = NMX::IResult (*)(const NMX::IStoreReader& access, NMX::TSubjectStoreId id);
 
-[[nodiscard]] constexpr bool IsBasicObject(std::uint32_t objectKind)
-{
-  return (objectKind & NMX::SubjectFlag::objectKindMask) == NMX::SubjectFlag::rigid;
-}
+/// `InvalidArgument` unless the store's object-kind answer is that of a basic object, of a smart one, of either.
+NMX::IResult MustBeBasicObject(const NMX::IStoreReader& access, NMX::TSubjectStoreId id);
+NMX::IResult MustBeSmartObject(const NMX::IStoreReader& access, NMX::TSubjectStoreId id);
+NMX::IResult MustBeObject(const NMX::IStoreReader& access, NMX::TSubjectStoreId id);
 
-[[nodiscard]] constexpr bool IsSmartObject(std::uint32_t objectKind)
-{
-  return (objectKind & NMX::SubjectFlag::smart) != 0;
-}
+/// `NotSupported` unless it is a character from clusters.
+NMX::IResult MustBeCharacter(const NMX::IStoreReader& access, NMX::TSubjectStoreId id);
 
-[[nodiscard]] constexpr bool IsObject(std::uint32_t objectKind)
-{
-  return (objectKind & NMX::SubjectFlag::objectKindMask) != 0;
-}
-
-/// Finds a subject by name and tests its kind: the store's failure, or `InvalidArgument` for another kind.
-NMX::IResult FindSubject(const NMX::IStoreReader& access, std::string_view name, KindRule rule,
+/// Finds a subject by name and asks the rule: the store's failure, or the rule's.
+NMX::IResult FindSubject(const NMX::IStoreReader& access, std::string_view name, SubjectRule rule,
                          NMX::TSubjectStoreId& id);
 
 /// Logs the exception that is being handled.
@@ -57,7 +50,7 @@ NMX::IResult Guarded(Operation operation) noexcept
 
 /// Reads from the subject of that name: `step(reader, id)`.
 template <class Step>
-NMX::IResult ReadSubject(const NMX::IStore& store, std::string_view name, KindRule rule, Step step) noexcept
+NMX::IResult ReadSubject(const NMX::IStore& store, std::string_view name, SubjectRule rule, Step step) noexcept
 {
   return Guarded(
       [&]() -> NMX::IResult
@@ -72,7 +65,7 @@ NMX::IResult ReadSubject(const NMX::IStore& store, std::string_view name, KindRu
 
 /// Edits the subject of that name: `step(editor, id)`, committed when it succeeds.
 template <class Step>
-NMX::IResult EditSubject(NMX::IStore& store, std::string_view name, KindRule rule, Step step) noexcept
+NMX::IResult EditSubject(NMX::IStore& store, std::string_view name, SubjectRule rule, Step step) noexcept
 {
   return Guarded(
       [&]() -> NMX::IResult
@@ -89,7 +82,7 @@ NMX::IResult EditSubject(NMX::IStore& store, std::string_view name, KindRule rul
 
 /// A getter: one entry of the subject of that name.
 template <class T>
-NMX::IResult ReadEntry(const NMX::IStore& store, std::string_view name, KindRule rule, NMX::EntryPath path,
+NMX::IResult ReadEntry(const NMX::IStore& store, std::string_view name, SubjectRule rule, NMX::EntryPath path,
                        T& value) noexcept
 {
   return ReadSubject(store, name, rule, [&](const NMX::IStoreReader& reader, NMX::TSubjectStoreId id)
@@ -97,7 +90,7 @@ NMX::IResult ReadEntry(const NMX::IStore& store, std::string_view name, KindRule
 }
 
 /// A setter: one entry of the subject of that name.
-inline NMX::IResult WriteEntry(NMX::IStore& store, std::string_view name, KindRule rule, NMX::EntryPath path,
+inline NMX::IResult WriteEntry(NMX::IStore& store, std::string_view name, SubjectRule rule, NMX::EntryPath path,
                                NMX::Value value, NMX::ENotify notify = NMX::ENotify::No) noexcept
 {
   return EditSubject(store, name, rule, [&](NMX::IEntryEditor& editor, NMX::TSubjectStoreId id)

@@ -26,6 +26,11 @@ std::string OnOneLine(std::string text)
   return text;
 }
 
+std::string Message(const Place& place, std::string_view problem)
+{
+  return OnOneLine(PlaceText(place) + ": " + std::string(problem));
+}
+
 }
 
 std::string PlaceText(const Place& place)
@@ -35,7 +40,12 @@ std::string PlaceText(const Place& place)
 
 void Fail(const Place& place, std::string_view problem)
 {
-  throw ConfigurationError(OnOneLine(PlaceText(place) + ": " + std::string(problem)));
+  throw ConfigurationError(Message(place, problem));
+}
+
+void FailUnreadable(const std::filesystem::path& file, std::string_view problem)
+{
+  throw UnreadableFileError(Message({&file}, problem));
 }
 
 std::string Quoted(std::string_view text)

@@ -18,6 +18,14 @@ public:
   using std::runtime_error::runtime_error;
 };
 
+/// The same, when nothing is wrong with what the file says but the file itself cannot be read: it is missing, no
+/// regular file, not permitted, or reading it fails.
+class UnreadableFileError : public ConfigurationError
+{
+public:
+  using ConfigurationError::ConfigurationError;
+};
+
 /// Where something stands in a file. Lines and columns count from 1, columns in characters.
 struct Place
 {
@@ -31,6 +39,9 @@ struct Place
 
 /// Throws the ConfigurationError that tells of a problem at a place.
 [[noreturn]] void Fail(const Place& place, std::string_view problem);
+
+/// Throws the UnreadableFileError that tells why a file cannot be read.
+[[noreturn]] void FailUnreadable(const std::filesystem::path& file, std::string_view problem);
 
 /// Text of a file as messages quote it; what is too long is cut.
 [[nodiscard]] std::string Quoted(std::string_view text);

@@ -45,22 +45,16 @@ private:
 
 void Parser::Parse()
 {
-  EnterFirstVersion(m_xml, "SubjectConfiguration");
-  constexpr std::array<std::string_view, 3> sections{"Devices", "Presets", "Subjects"};
-  Once once;
-  while (const auto section = m_xml.EnterChild())
+  const Element root = EnterFirstVersion(m_xml, "SubjectConfiguration");
+  const auto each = [this](std::string_view name, void (Parser::*read)(const Element&))
   {
-    if (std::find(sections.begin(), sections.end(), section->name) == sections.end())
-      FailUnknown(*section, sections);
-    once.Check(section->place, Tag(section->name), section->name);
-    section->AllowAttributes({});
-    if (section->name == "Devices")
-      ForEachChild(m_xml, "Device", [this](const Element& element) { ReadDevice(element); });
-    else if (section->name == "Presets")
-      ForEachChild(m_xml, "Preset", [this](const Element& element) { ReadPreset(element); });
-    else
-      ForEachChild(m_xml, "Subject", [this](const Element& element) { ReadSubject(element); });
-  }
+    return [this, name, read](const Element& /*section*/)
+    { ForEachChild(m_xml, name, [this, read](const Element& element) { (this->*read)(element); }); };
+  };
+  ReadSections(m_xml, root,
+               {{"Devices", EPresence::Optional, each("Device", &Parser::ReadDevice)},
+                {"Presets", EPresence::Optional, each("Preset", &Parser::ReadPreset)},
+                {"Subjects", EPresence::Optional, each("Subject", &Parser::ReadSubject)}});
   m_xml.End();
 }
 

@@ -1,5 +1,7 @@
 #include "StandaloneHost/Files/ElementParts.h"
 
+#include <algorithm>
+
 namespace Files
 {
 
@@ -17,6 +19,26 @@ Element EnterFirstVersion(ElementReader& xml, std::string_view name)
   if (const std::string& version = root.RequiredAttribute("version"); version != "1")
     Fail(root.place, "the version is " + Quoted(version) + ", expected 1");
   return root;
+}
+
+void ReadSections(ElementReader& xml, const Element& parent, std::initializer_list<Section> sections)
+{
+  std::vector<std::string_view> names;
+  for (const Section& section : sections)
+    names.push_back(section.name);
+  Once once;
+  while (const auto element = xml.EnterChild())
+  {
+    const auto named = std::find(names.begin(), names.end(), element->name);
+    if (named == names.end())
+      FailUnknown(*element, names);
+    once.Check(element->place, Tag(element->name), element->name);
+    element->AllowAttributes({});
+    sections.begin()[named - names.begin()].read(*element);
+  }
+  for (const Section& section : sections)
+    if (section.presence == EPresence::Required && !once.Seen(section.name))
+      Fail(parent.place, Tag(parent.name) + " lacks an element, expected " + std::string(section.name));
 }
 
 std::vector<NMX::Position> ReadMarkers(ElementReader& xml)

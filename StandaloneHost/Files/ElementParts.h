@@ -4,7 +4,9 @@
 #include "StandaloneHost/Files/ValueText.h"
 #include "StoreInterface/Value.h"
 
+#include <cstddef>
 #include <functional>
+#include <initializer_list>
 #include <map>
 #include <string>
 #include <string_view>
@@ -19,6 +21,7 @@ class Once
 public:
   /// `what` names the thing in messages, `key` tells it from others.
   void Check(const Place& place, std::string_view what, std::string_view key);
+  [[nodiscard]] bool Seen(std::string_view key) const { return m_places.contains(key); }
 
 private:
   std::map<std::string, Place, std::less<>> m_places;
@@ -45,6 +48,48 @@ void ForEachChild(ElementReader& xml, std::string_view name, ReadChild readChild
     readChild(*child);
   }
 }
+
+/// What the children of a list are: all have that element name, and there are 1 to `most`.
+struct ListForm
+{
+  std::string_view element;
+  std::string_view noun; ///< what messages call one of them
+  std::size_t most;
+};
+
+/// Reads each child of a list, which is the element that was entered last.
+template <class ReadChild>
+void ForEachInList(ElementReader& xml, const Element& list, const ListForm& form, ReadChild readChild)
+{
+  std::size_t count = 0;
+  ForEachChild(xml, form.element,
+               [&](const Element& child)
+               {
+                 if (count++ == form.most)
+                   Fail(child.place,
+                        "one " + std::string(form.noun) + " too many, expected at most " + std::to_string(form.most));
+                 readChild(child);
+               });
+  if (count == 0)
+    Fail(list.place, Tag(list.name) + " is empty, expected at least one " + std::string(form.element));
+}
+
+enum class EPresence
+{
+  Required,
+  Optional
+};
+
+/// A child without attributes that an element has at most once, and what reads and leaves it.
+struct Section
+{
+  std::string_view name;
+  EPresence presence;
+  std::function<void(const Element&)> read;
+};
+
+/// Reads the children of `parent`, which is the element that was entered last: these sections, in any order.
+void ReadSections(ElementReader& xml, const Element& parent, std::initializer_list<Section> sections);
 
 /// The places of the markers that the element that was entered last consists of.
 [[nodiscard]] std::vector<NMX::Position> ReadMarkers(ElementReader& xml);

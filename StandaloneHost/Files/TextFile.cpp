@@ -20,14 +20,14 @@ std::size_t CheckedSize(const std::filesystem::path& file, std::size_t maximumBy
   std::error_code error;
   const auto status = std::filesystem::status(file, error);
   if (error)
-    Fail({&file}, "the file cannot be read: " + error.message());
+    FailUnreadable(file, "the file cannot be read: " + error.message());
   // Anything else could keep the host waiting for ever.
   if (!std::filesystem::is_regular_file(status))
-    Fail({&file}, std::filesystem::is_directory(status) ? "this is a directory, expected a file"
-                                                        : "this is a device or a pipe, expected a file");
+    FailUnreadable(file, std::filesystem::is_directory(status) ? "this is a directory, expected a file"
+                                                               : "this is a device or a pipe, expected a file");
   const auto size = std::filesystem::file_size(file, error);
   if (error)
-    Fail({&file}, "the file cannot be read: " + error.message());
+    FailUnreadable(file, "the file cannot be read: " + error.message());
   if (size > maximumBytes)
     Fail({&file}, "the file has " + std::to_string(size) + " bytes, expected at most " + std::to_string(maximumBytes));
   return static_cast<std::size_t>(size);
@@ -77,7 +77,7 @@ std::string ReadTextFile(const std::filesystem::path& file, std::size_t maximumB
   std::ifstream in(file, std::ios::binary);
   in.read(text.data(), static_cast<std::streamsize>(text.size()));
   if (!in.is_open() || in.bad())
-    Fail({&file}, "the file cannot be read: " + std::generic_category().message(errno));
+    FailUnreadable(file, "the file cannot be read: " + std::generic_category().message(errno));
   text.resize(static_cast<std::size_t>(in.gcount()));
 
   if (text.starts_with(byteOrderMark))

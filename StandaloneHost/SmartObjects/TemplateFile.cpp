@@ -3,41 +3,34 @@
 #include "StandaloneHost/Files/ElementParts.h"
 #include "StandaloneHost/Files/ElementReader.h"
 
-#include <algorithm>
-#include <array>
 #include <cstddef>
-#include <string_view>
 
 namespace SmartObjects
 {
 
 using Files::Element;
 using Files::ElementReader;
+using Files::EPresence;
 
 namespace
 {
 
 constexpr std::size_t maximumTemplateBytes = std::size_t{1} << 20;
-constexpr std::size_t maximumClusters = 64;
+constexpr Files::ListForm clusterList{"SmartCluster", "cluster", 64};
 
 std::vector<ClusterTemplate> ReadClusters(ElementReader& xml, const Element& section)
 {
   std::vector<ClusterTemplate> clusters;
   Files::Once once;
-  Files::ForEachChild(xml, "SmartCluster",
-                      [&](const Element& element)
-                      {
-                        if (clusters.size() == maximumClusters)
-                          Files::Fail(element.place,
-                                      "one cluster too many, expected at most " + std::to_string(maximumClusters));
-                        element.AllowAttributes({"label", "type"});
-                        const std::string& label = element.FilledAttribute("label");
-                        once.Check(element.place, "label " + Files::Quoted(label), label);
-                        clusters.push_back({label, element.FilledAttribute("type")});
-                        xml.LeaveEmpty();
-                      });
-  if (clusters.empty())
-    Files::Fail(section.place, Files::Tag(section.name) + " is empty, expected at least one SmartCluster");
+  Files::ForEachInList(xml, section, clusterList,
+                       [&](const Element& element)
+                       {
+                         element.AllowAttributes({"label", "type"});
+                         const std::string& label = element.FilledAttribute("label");
+                         once.Check(element.place, "label " + Files::Quoted(label), label);
+                         clusters.push_back({label, element.FilledAttribute("type")});
+                         xml.LeaveEmpty();
+                       });
   return clusters;
 }
 
@@ -47,24 +40,13 @@ SmartObjectTemplate ReadTemplate(const std::filesystem::path& file)
 {
   ElementReader xml(file, maximumTemplateBytes);
   const Element root = Files::EnterFirstVersion(xml, "SmartObjectTemplate");
-
-  constexpr std::array<std::string_view, 2> sections{"SmartClusters", "AdditionalMarkerPositions"};
   SmartObjectTemplate content;
-  Files::Once once;
-  while (const auto section = xml.EnterChild())
-  {
-    if (std::find(sections.begin(), sections.end(), section->name) == sections.end())
-      Files::FailUnknown(*section, sections);
-    once.Check(section->place, Files::Tag(section->name), section->name);
-    section->AllowAttributes({});
-    if (section->name == "SmartClusters")
-      content.clusters = ReadClusters(xml, *section);
-    else
-      content.additionalMarkers = Files::ReadMarkers(xml);
-  }
+  Files::ReadSections(xml, root,
+                      {{"SmartClusters", EPresence::Required,
+                        [&](const Element& section) { content.clusters = ReadClusters(xml, section); }},
+                       {"AdditionalMarkerPositions", EPresence::Optional,
+                        [&](const Element& /*section*/) { content.additionalMarkers = Files::ReadMarkers(xml); }}});
   xml.End();
-  if (content.clusters.empty())
-    Files::Fail(root.place, Files::Tag(root.name) + " lacks an element, expected SmartClusters");
   return content;
 }
 

@@ -5,9 +5,17 @@
 namespace Store
 {
 
-/// Brings up to date, before a commit, what subjects have because of other subjects: the warnings of objects that
-/// follow from groups, devices and patterns; a character is warned while an object in one of its slots has warnings.
-/// Costs what the edit touched.
-void DeriveDependents(Draft& draft);
+/// What the host wants to be derived.
+struct DerivationRules
+{
+  bool autoAssign = true; ///< whether characters' empty slots are filled by themselves
+};
+
+/// Brings up to date, before a commit, what subjects have because of other subjects: the warnings of objects, and the
+/// slots of characters with the warnings that follow from them. Costs what the edit touched.
+void DeriveDependents(Draft& draft, const DerivationRules& rules);
+
+/// The same for all subjects, whatever the draft has changed.
+void DeriveAll(Draft& draft, const DerivationRules& rules);
 
 }

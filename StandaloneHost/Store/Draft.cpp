@@ -2,6 +2,7 @@
 
 #include "StandaloneHost/Store/VStoreReader.h"
 
+#include <algorithm>
 #include <utility>
 
 namespace Store
@@ -105,6 +106,25 @@ void Draft::Rename(Id id, std::string name)
   m_names[record.Name()] = Id{};
   m_names[name] = id;
   record.name = std::move(name);
+}
+
+void Draft::MoveUnder(Id id, Id parent, Id slot)
+{
+  const auto childrenOf = [this](Id of) -> std::vector<Id>&
+  { return std::get<std::vector<Id>>(Change(of, NMX::EAspect::Parameters).values[CommonValue::children]); };
+  SubjectRecord& record = Change(id, NMX::EAspect::Parameters);
+  if (record.Parent() != parent)
+  {
+    if (record.Parent().Valid())
+      std::erase(childrenOf(record.Parent()), id);
+    if (parent.Valid())
+    {
+      auto& siblings = childrenOf(parent);
+      siblings.insert(std::lower_bound(siblings.begin(), siblings.end(), id), id);
+    }
+  }
+  record.values[CommonValue::parent] = parent;
+  record.values[CommonValue::parentSlot] = slot;
 }
 
 void Draft::SetApplicationEntry(NMX::EntryPath path, NMX::Value value)

@@ -31,6 +31,9 @@ public:
   void Rename(Id id, std::string name);
   void SetApplicationEntry(NMX::EntryPath path, NMX::Value value);
 
+  /// Makes a subject the child of another, or of none, and puts it into that slot of its new parent, or none.
+  void MoveUnder(Id id, Id parent, Id slot = {});
+
   /// The subject's record, to be changed in the given aspect. The subject exists.
   SubjectRecord& Change(Id id, NMX::EAspect aspect);
 

@@ -89,9 +89,21 @@ class Deriver
 public:
   explicit Deriver(Draft& draft) : m_draft(draft) {}
 
-  void Run()
+  void RunForTouched()
   {
     FindTouched();
+    Run();
+  }
+
+  void RunForAll()
+  {
+    TouchAll(All);
+    Run();
+  }
+
+private:
+  void Run()
+  {
     for (const auto& [id, aspects] : m_touched)
     {
       const SubjectRecord* record = m_draft.Find(id);
@@ -115,7 +127,6 @@ public:
     }
   }
 
-private:
   /// What of an object may be others: its warnings of…
   enum Aspect : unsigned
   {
@@ -192,9 +203,14 @@ private:
     for (const std::string& key : keys)
       ForEachLinked(key, [&](const SubjectRecord& record) { m_touched[record.id] |= AspectOf(key); });
     if (all)
-      for (const NMX::ESubjectKind kind : {NMX::ESubjectKind::BasicObjects, NMX::ESubjectKind::SmartObjects})
-        for (const Id id : m_draft.Subjects(kind))
-          m_touched[id] |= TemplateGroups;
+      TouchAll(TemplateGroups);
+  }
+
+  void TouchAll(unsigned aspects)
+  {
+    for (const NMX::ESubjectKind kind : {NMX::ESubjectKind::BasicObjects, NMX::ESubjectKind::SmartObjects})
+      for (const Id id : m_draft.Subjects(kind))
+        m_touched[id] |= aspects;
   }
 
   /// Whether a change of an object can change its warnings or another's.
@@ -344,7 +360,12 @@ private:
 
 void DeriveObjectWarnings(Draft& draft)
 {
-  Deriver(draft).Run();
+  Deriver(draft).RunForTouched();
+}
+
+void DeriveAllObjectWarnings(Draft& draft)
+{
+  Deriver(draft).RunForAll();
 }
 
 }

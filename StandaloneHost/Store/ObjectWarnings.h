@@ -18,4 +18,7 @@ namespace Store
 ///   of its members. Objects of a template group are identical when they have the same markers and types of cluster.
 void DeriveObjectWarnings(Draft& draft);
 
+/// The same for all objects.
+void DeriveAllObjectWarnings(Draft& draft);
+
 }

@@ -99,7 +99,7 @@ std::vector<Row> Rows()
       Group(all, Paths::Roles()),
       Group(all, Paths::Warnings()),
 
-      {basic | smart, Paths::AutoAssignedName(), EValueType::Text, {}},
+      {basic | smart, Paths::AutoAssignedName(), EValueType::Text, std::string{}},
       {basic | smart, Paths::AutoAssignEnabled(), EValueType::Bool, false},
       {basic | smart | cluster, Paths::ColourRGBA(), EValueType::Colour, NMX::Colour{}},
       {basic | smart, Paths::EntranceThreshold(), EValueType::UInt32, 0U},
@@ -199,10 +199,9 @@ std::uint64_t KindSchema::WarningBits()
   return ~std::uint64_t{0} << firstWarningBit;
 }
 
-std::uint64_t KindSchema::ChildWarningBit()
+std::uint64_t KindSchema::CharacterBit(NMX::EntryPath path)
 {
-  static const unsigned index = Of(ESubjectKind::CharactersFromClusters).Find(Paths::WarningCFCChildWarning())->index;
-  return std::uint64_t{1} << index;
+  return std::uint64_t{1} << Of(ESubjectKind::CharactersFromClusters).Find(path)->index;
 }
 
 }

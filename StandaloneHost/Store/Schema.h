@@ -69,8 +69,8 @@ public:
 
   /// The bits that are warnings, the same for every kind.
   [[nodiscard]] static std::uint64_t WarningBits();
-  /// The bit of the warning that a character has while an object in one of its slots has warnings.
-  [[nodiscard]] static std::uint64_t ChildWarningBit();
+  /// The bit of a truth value of characters.
+  [[nodiscard]] static std::uint64_t CharacterBit(NMX::EntryPath path);
 
 private:
   explicit KindSchema(NMX::ESubjectKind kind);

@@ -1,5 +1,6 @@
 #include "StandaloneHost/Store/StoreState.h"
 
+#include "StandaloneHost/Store/CharacterSlots.h"
 #include "StandaloneHost/Store/ObjectLinks.h"
 
 #include <utility>
@@ -29,6 +30,8 @@ void StoreState::Erase(NMX::TSubjectStoreId id)
   for (const std::string& key : LinksOf(*found->second))
     if (const auto link = m_links.find(key); link->second.erase(id) != 0 && link->second.empty())
       m_links.erase(link);
+  m_autoAssignable.erase(id);
+  m_awaitingObjects.erase(id);
   m_records.erase(found);
 }
 
@@ -40,6 +43,10 @@ void StoreState::Insert(std::unique_ptr<SubjectRecord> record)
   m_kinds[static_cast<std::size_t>(place->kind)].insert(place->id);
   for (const std::string& key : LinksOf(*place))
     m_links[key].insert(place->id);
+  if (IsAutoAssignable(*place))
+    m_autoAssignable.insert(place->id);
+  if (AwaitsObjects(*place))
+    m_awaitingObjects.insert(place->id);
 }
 
 void StoreState::Apply(ChangeSet&& changes) noexcept

@@ -52,6 +52,10 @@ public:
 
   /// The objects that have a link (see LinksOf).
   [[nodiscard]] const std::set<NMX::TSubjectStoreId>& Linked(const std::string& key) const;
+  /// The objects that may be assigned to slots, see IsAutoAssignable.
+  [[nodiscard]] const std::set<NMX::TSubjectStoreId>& AutoAssignable() const { return m_autoAssignable; }
+  /// The characters whose empty slots are to be filled, see AwaitsObjects.
+  [[nodiscard]] const std::set<NMX::TSubjectStoreId>& AwaitingObjects() const { return m_awaitingObjects; }
   [[nodiscard]] const std::map<NMX::EntryPath, NMX::Value>& ApplicationEntries() const { return m_application; }
   [[nodiscard]] NMX::TSubjectStoreId NextId() const { return m_nextId; }
   [[nodiscard]] std::size_t SubjectCount() const { return m_records.size(); }
@@ -69,6 +73,8 @@ private:
   boost::unordered_flat_map<std::string_view, const SubjectRecord*> m_names; // keys look into the records
   std::array<std::set<NMX::TSubjectStoreId>, NMX::allSubjectKinds.size()> m_kinds;
   boost::unordered_flat_map<std::string, std::set<NMX::TSubjectStoreId>> m_links;
+  std::set<NMX::TSubjectStoreId> m_autoAssignable;
+  std::set<NMX::TSubjectStoreId> m_awaitingObjects;
   std::map<NMX::EntryPath, NMX::Value> m_application;
   NMX::TSubjectStoreId m_nextId{1};
   std::uint64_t m_lastStamp = 0;

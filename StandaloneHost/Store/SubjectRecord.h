@@ -23,6 +23,11 @@ struct alignas(64) SubjectRecord
   {
     return std::get<NMX::TSubjectStoreId>(values[CommonValue::parent]);
   }
+  /// The slot of its parent that the subject is in.
+  [[nodiscard]] NMX::TSubjectStoreId ParentSlot() const
+  {
+    return std::get<NMX::TSubjectStoreId>(values[CommonValue::parentSlot]);
+  }
   [[nodiscard]] const std::vector<NMX::TSubjectStoreId>& Children() const
   {
     return std::get<std::vector<NMX::TSubjectStoreId>>(values[CommonValue::children]);

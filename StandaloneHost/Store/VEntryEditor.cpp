@@ -1,23 +1,21 @@
 #include "StandaloneHost/Store/VEntryEditor.h"
 
 #include "HostInterface/DebugServices/CallAssertFailHandler.h"
-#include "StandaloneHost/Store/Derivation.h"
 #include "StandaloneHost/Store/NameRule.h"
 #include "StandaloneHost/Store/VStoreReader.h"
 #include "StoreInterface/EntryPaths.h"
 
-#include <algorithm>
 #include <utility>
 
 namespace Store
 {
 
-using NMX::EAspect;
 using NMX::EResult;
 using NMX::IResult;
 
-VEntryEditor::VEntryEditor(const StoreState& state, std::mutex& editMutex, ICommitter& committer)
-    : m_edit(editMutex, std::defer_lock), m_draft(state), m_committer(committer)
+VEntryEditor::VEntryEditor(const StoreState& state, const DerivationRules& rules, std::mutex& editMutex,
+                           ICommitter& committer)
+    : m_edit(editMutex, std::defer_lock), m_rules(rules), m_draft(state), m_committer(committer)
 {
   if (VStoreReader::HeldByThisThread() == 0)
   {
@@ -77,9 +75,9 @@ IResult VEntryEditor::Remove(Id id)
   const Id parent = record->Parent();
   ForgetLatest();
   for (const Id child : children)
-    MoveUnder(child, Id{});
-  if (m_draft.Find(parent) != nullptr)
-    RemoveChild(parent, id);
+    m_draft.MoveUnder(child, Id{});
+  if (parent.Valid())
+    m_draft.MoveUnder(id, Id{});
   m_draft.Remove(id);
   return EResult::Ok;
 }
@@ -140,29 +138,8 @@ IResult VEntryEditor::SetParent(Id id, Id parent)
   for (Id ancestor = parent; ancestor.Valid(); ancestor = m_draft.Find(ancestor)->Parent())
     if (ancestor == id)
       return EResult::InvalidValue;
-  MoveUnder(id, parent);
+  m_draft.MoveUnder(id, parent);
   return EResult::Ok;
-}
-
-void VEntryEditor::MoveUnder(Id id, Id parent)
-{
-  SubjectRecord& record = m_draft.Change(id, EAspect::Parameters);
-  if (record.Parent().Valid())
-    RemoveChild(record.Parent(), id);
-  record.values[CommonValue::parent] = parent;
-  if (!parent.Valid())
-  {
-    record.values[CommonValue::parentSlot] = Id{};
-    return;
-  }
-  auto& siblings = std::get<std::vector<Id>>(m_draft.Change(parent, EAspect::Parameters).values[CommonValue::children]);
-  siblings.insert(std::lower_bound(siblings.begin(), siblings.end(), id), id);
-}
-
-void VEntryEditor::RemoveChild(Id parent, Id child)
-{
-  auto& siblings = std::get<std::vector<Id>>(m_draft.Change(parent, EAspect::Parameters).values[CommonValue::children]);
-  std::erase(siblings, child);
 }
 
 IResult VEntryEditor::SetApplicationEntry(NMX::EntryPath path, NMX::Value value)
@@ -180,7 +157,7 @@ IResult VEntryEditor::Commit()
 {
   if (!Open())
     return m_closed;
-  DeriveDependents(m_draft);
+  DeriveDependents(m_draft, m_rules);
   ForgetLatest();
   return m_committer.Commit(std::move(m_draft.Changes()), std::move(m_edit));
 }

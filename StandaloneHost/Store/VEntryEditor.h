@@ -1,5 +1,6 @@
 #pragma once
 
+#include "StandaloneHost/Store/Derivation.h"
 #include "StandaloneHost/Store/Draft.h"
 #include "StandaloneHost/Store/ReaderOperations.h"
 #include "StoreInterface/IEntryEditor.h"
@@ -25,7 +26,7 @@ protected:
 class VEntryEditor final : public ReaderOperations<VEntryEditor, NMX::IEntryEditor>
 {
 public:
-  VEntryEditor(const StoreState& state, std::mutex& editMutex, ICommitter& committer);
+  VEntryEditor(const StoreState& state, const DerivationRules& rules, std::mutex& editMutex, ICommitter& committer);
 
   NMX::IResult Subjects(NMX::ESubjectKind kind, std::vector<Id>& ids) const override;
   [[nodiscard]] const NMX::Value* FindApplicationEntry(NMX::EntryPath path) const override;
@@ -46,11 +47,10 @@ private:
   [[nodiscard]] bool Open() const { return m_edit.owns_lock(); }
   [[nodiscard]] NMX::IResult CheckName(std::string_view name, Id owner) const;
   NMX::IResult SetParent(Id id, Id parent);
-  void MoveUnder(Id id, Id parent);
-  void RemoveChild(Id parent, Id child);
 
   std::unique_lock<std::mutex> m_edit;
   NMX::IResult m_closed = NMX::EResult::NotAvailable; // the answer to edits when it is not open
+  const DerivationRules& m_rules;
   Draft m_draft;
   ICommitter& m_committer;
 };

@@ -12,14 +12,27 @@ namespace Store
 using NMX::EResult;
 using NMX::IResult;
 
-VStore::VStore() : VStore(nullptr) {}
+VStore::VStore(DerivationRules rules) : VStore(nullptr, rules) {}
 
-VStore::VStore(std::unique_ptr<IArchive> archive) : m_archive(std::move(archive))
+VStore::VStore(std::unique_ptr<IArchive> archive, DerivationRules rules) : m_rules(rules), m_archive(std::move(archive))
 {
   for (auto& callback : m_kindCallbacks)
     callback = NMX::MakeShared<Callback>();
   if (m_archive)
+  {
     m_state.Apply(m_archive->Load());
+    BringUpToDate();
+  }
+}
+
+/// Whoever wrote the archive may have had other rules.
+void VStore::BringUpToDate()
+{
+  Draft draft(m_state);
+  draft.Begin();
+  DeriveAll(draft, m_rules);
+  if (!draft.Changes().Empty() && m_archive->Keep(draft.Changes()).Succeeded())
+    m_state.Apply(std::move(draft.Changes()));
 }
 
 VStore::~VStore() = default;
@@ -32,7 +45,7 @@ std::unique_ptr<const NMX::IStoreReader> VStore::Reader() const
 std::unique_ptr<NMX::IEntryEditor> VStore::Editor()
 {
   ICommitter& committer = *this;
-  return std::make_unique<VEntryEditor>(m_state, m_editMutex, committer);
+  return std::make_unique<VEntryEditor>(m_state, m_rules, m_editMutex, committer);
 }
 
 std::shared_ptr<NMX::IStore::ChangeCallback> VStore::SubjectsChanged(NMX::ESubjectKind kind)

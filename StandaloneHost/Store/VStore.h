@@ -23,10 +23,11 @@ class VStore : public NMX::IStore, public NMX::VShared, private ICommitter
 {
 public:
   /// A store that keeps nothing.
-  VStore();
+  explicit VStore(DerivationRules rules = {});
 
-  /// Starts from what the archive holds. Throws ArchiveError when it cannot be read.
-  explicit VStore(std::unique_ptr<IArchive> archive);
+  /// Starts from what the archive holds, and derives afresh what follows from it. Throws ArchiveError when it cannot be
+  /// read.
+  explicit VStore(std::unique_ptr<IArchive> archive, DerivationRules rules = {});
   ~VStore() override;
 
   [[nodiscard]] std::unique_ptr<const NMX::IStoreReader> Reader() const override;
@@ -51,9 +52,11 @@ private:
   };
 
   NMX::IResult Commit(ChangeSet&& changes, std::unique_lock<std::mutex> edit) override;
+  void BringUpToDate();
   void TellSubjects(unsigned kinds);
   void TellApplication(const std::vector<NMX::EntryPath>& paths);
 
+  const DerivationRules m_rules;
   // Lock order: m_editMutex before m_stateMutex; m_patternMutex alone.
   std::mutex m_editMutex;
   mutable std::shared_mutex m_stateMutex;

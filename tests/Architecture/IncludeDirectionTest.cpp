@@ -34,8 +34,9 @@ const std::map<std::string, std::set<std::string>> allowed{
       "RunaCorePluginSubjectStore/ObjectEvaluationServices", "HostInterface"}},
     {"RunaCorePluginSubjectStore/Plugin",
      {"RunaCorePluginSubjectStore/Catalogue", "RunaCorePluginSubjectStore/TerminalServer2",
-      "RunaCorePluginSubjectStore/BasicObjectServices", "RunaCorePluginSubjectStore/ObjectEvaluationServices",
-      "RunaCorePluginSubjectStore/SmartObjectServices", "HostInterface", "StoreInterface"}},
+      "RunaCorePluginSubjectStore/BasicObjectServices", "RunaCorePluginSubjectStore/CharacterFromClustersServices",
+      "RunaCorePluginSubjectStore/ObjectEvaluationServices", "RunaCorePluginSubjectStore/SmartObjectServices",
+      "HostInterface", "StoreInterface"}},
 
     {"StandaloneHost/Store", {"HostInterface", "StoreInterface"}},
     {"StandaloneHost/Evaluation", {"HostInterface", "StoreInterface"}},
@@ -43,12 +44,13 @@ const std::map<std::string, std::set<std::string>> allowed{
     {"StandaloneHost/Server", {"HostInterface"}},
     {"StandaloneHost/Simulation", {"HostInterface", "StoreInterface"}},
     {"StandaloneHost/Files", {"StandaloneHost/Store", "HostInterface", "StoreInterface"}},
+    {"StandaloneHost/Characters", {"StandaloneHost/Files", "HostInterface", "StoreInterface"}},
     {"StandaloneHost/SmartObjects",
      {"StandaloneHost/Files", "StandaloneHost/Store", "HostInterface", "StoreInterface"}},
     {"StandaloneHost",
      {"StandaloneHost/Store", "StandaloneHost/Postal", "StandaloneHost/Server", "StandaloneHost/Files",
-      "StandaloneHost/Evaluation", "StandaloneHost/Simulation", "StandaloneHost/SmartObjects", "HostInterface",
-      "StoreInterface"}},
+      "StandaloneHost/Characters", "StandaloneHost/Evaluation", "StandaloneHost/Simulation",
+      "StandaloneHost/SmartObjects", "HostInterface", "StoreInterface"}},
 };
 
 /// The folder of `allowed` that a file belongs to: the deepest that its path begins with.

@@ -1,9 +1,7 @@
 #include "RunaCorePluginSubjectStore/BasicObjectServices/VBasicObjectServices.h"
-#include "StandaloneHost/Store/VStore.h"
-#include "StoreInterface/EntryPaths.h"
-#include "StoreInterface/TypedAccess.h"
 #include "tests/Support/LogCapture.h"
 #include "tests/Support/MockStore.h"
+#include "tests/Support/StoreFixture.h"
 
 #include <gmock/gmock.h>
 
@@ -22,31 +20,14 @@ namespace Paths = NMX::Paths;
 namespace
 {
 
-class BasicObjectServicesTest : public testing::Test
+class BasicObjectServicesTest : public StoreFixture
 {
 protected:
   BasicObjectServicesTest()
   {
-    const auto editor = store->Editor();
-    crate = Add(*editor, NMX::ESubjectKind::BasicObjects, "Crate");
-    Add(*editor, NMX::ESubjectKind::BasicObjects, "Sword");
-    Add(*editor, NMX::ESubjectKind::SmartObjects, "Glove");
-    Add(*editor, NMX::ESubjectKind::CharactersFromClusters, "Ada");
-    EXPECT_TRUE(editor->Commit().Succeeded());
-  }
-
-  static NMX::TSubjectStoreId Add(NMX::IEntryEditor& editor, NMX::ESubjectKind kind, const char* name)
-  {
-    NMX::TSubjectStoreId id;
-    EXPECT_TRUE(editor.Add(kind, name, id).Succeeded());
-    return id;
-  }
-
-  void Set(NMX::TSubjectStoreId id, NMX::EntryPath path, NMX::Value value)
-  {
-    const auto editor = store->Editor();
-    EXPECT_TRUE(editor->SetValue(id, path, std::move(value)).Succeeded());
-    EXPECT_TRUE(editor->Commit().Succeeded());
+    Add(NMX::ESubjectKind::BasicObjects, "Sword");
+    Add(NMX::ESubjectKind::SmartObjects, "Glove");
+    Add(NMX::ESubjectKind::CharactersFromClusters, "Ada");
   }
 
   std::set<std::string> List()
@@ -56,10 +37,9 @@ protected:
     return names;
   }
 
-  std::shared_ptr<Store::VStore> store = NMX::MakeShared<Store::VStore>();
   std::shared_ptr<NMX::IBasicObjectServices> service =
       NMX::MakeShared<BasicObjectServices::VBasicObjectServices>(store);
-  NMX::TSubjectStoreId crate;
+  const Id crate = Add(NMX::ESubjectKind::BasicObjects, "Crate");
 };
 
 }

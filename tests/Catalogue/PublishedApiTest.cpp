@@ -1,9 +1,11 @@
 #include "RunaCorePluginSubjectStore/BasicObjectServices/BasicObjectWarnings.h"
 #include "RunaCorePluginSubjectStore/BasicObjectServices/VBasicObjectServices.h"
 #include "RunaCorePluginSubjectStore/Catalogue/BasicObjectCatalogue.h"
+#include "RunaCorePluginSubjectStore/Catalogue/CharacterFromClustersCatalogue.h"
 #include "RunaCorePluginSubjectStore/Catalogue/ObjectEvaluationCatalogue.h"
 #include "RunaCorePluginSubjectStore/Catalogue/SmartObjectCatalogue.h"
 #include "RunaCorePluginSubjectStore/CharacterFromClustersServices/CharacterWarnings.h"
+#include "RunaCorePluginSubjectStore/CharacterFromClustersServices/VCharacterFromClustersServices.h"
 #include "RunaCorePluginSubjectStore/ObjectEvaluationServices/VObjectEvaluationServices.h"
 #include "RunaCorePluginSubjectStore/SmartObjectServices/SmartObjectWarnings.h"
 #include "RunaCorePluginSubjectStore/SmartObjectServices/VSmartObjectServices.h"
@@ -93,6 +95,14 @@ void RegisterObjectEvaluation(RecordingServer& server, std::uint32_t mask)
                                                 std::make_shared<ManualPostal>(), mask);
 }
 
+void RegisterCharacters(RecordingServer& server, std::uint32_t mask)
+{
+  const auto service = NMX::MakeShared<CharacterFromClustersServices::VCharacterFromClustersServices>(
+      nullptr, NMX::MakeShared<Store::VStore>());
+  RegisterGroup<NMX::ICharacterFromClustersServices>(server, Catalogue::CharacterFromClustersGroup(), service,
+                                                     std::make_shared<ManualPostal>(), mask);
+}
+
 std::string Name(EArgumentType type, const TypeRecord* enumeration)
 {
   const auto enumerationName = [&] { return std::string(enumeration->name.substr(enumeration->name.find('.') + 1)); };
@@ -152,7 +162,8 @@ TEST(PublishedApi, GroupsAreRegisteredAsPromisedInTheirOrder)
   const std::map<std::string, void (*)(RecordingServer&, std::uint32_t)> groups{
       {"BasicObjectServices", RegisterBasicObjects},
       {"SmartObjectServices", RegisterSmartObjects},
-      {"ObjectEvaluationServices", RegisterObjectEvaluation}};
+      {"ObjectEvaluationServices", RegisterObjectEvaluation},
+      {"CharacterFromClustersServices", RegisterCharacters}};
   EXPECT_EQ(Promised().at("groups").as_array().size(), groups.size());
   for (const json::value& group : Promised().at("groups").as_array())
   {

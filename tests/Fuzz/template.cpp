@@ -1,13 +1,11 @@
 // A smart-object template: a file either reads as what a template promises, or is refused with its name.
 
 #include "StandaloneHost/SmartObjects/TemplateFile.h"
+#include "tests/Fuzz/TemplateTarget.h"
 
 #include <cmath>
-#include <cstdio>
-#include <cstdlib>
 #include <set>
 #include <string_view>
-#include <unistd.h>
 
 namespace
 {
@@ -28,21 +26,5 @@ bool Sound(const SmartObjects::SmartObjectTemplate& read)
 
 extern "C" int LLVMFuzzerTestOneInput(const unsigned char* data, std::size_t size)
 {
-  static const std::filesystem::path file = "/tmp/subject-store-fuzz-" + std::to_string(getpid()) + ".sot";
-  std::FILE* out = std::fopen(file.c_str(), "wb");
-  if (out == nullptr || std::fwrite(data, 1, size, out) != size)
-    std::abort();
-  std::fclose(out);
-  try
-  {
-    if (!Sound(SmartObjects::ReadTemplate(file)))
-      std::abort();
-  }
-  catch (const Files::ConfigurationError& failure)
-  {
-    if (!std::string_view(failure.what()).starts_with(file.string() + ':'))
-      std::abort();
-  }
-  std::filesystem::remove(file);
-  return 0;
+  return ReadsSoundOrRefuses(data, size, SmartObjects::ReadTemplate, Sound);
 }

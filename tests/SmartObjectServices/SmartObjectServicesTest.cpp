@@ -1,9 +1,9 @@
 #include "RunaCorePluginSubjectStore/SmartObjectServices/VSmartObjectServices.h"
 
 #include "RunaCorePluginSubjectStore/SmartObjectServices/DeviceTypes.h"
-#include "StandaloneHost/Store/VStore.h"
 #include "tests/Support/LogCapture.h"
 #include "tests/Support/ManualPostal.h"
+#include "tests/Support/StoreFixture.h"
 
 #include <gmock/gmock.h>
 
@@ -38,30 +38,22 @@ struct Locations : IFileLocations
   std::vector<std::wstring> folders;
 };
 
-class SmartObjectServicesTest : public testing::Test
+class SmartObjectServicesTest : public StoreFixture
 {
 protected:
   SmartObjectServicesTest()
   {
-    const auto editor = store->Editor();
-    EXPECT_TRUE(editor->Add(NMX::ESubjectKind::SmartObjects, "Glove", glove).Succeeded());
-    EXPECT_TRUE(
-        editor
-            ->SetValue(glove, Paths::SmartClusters(),
-                       std::vector<NMX::SmartCluster>{{"Back", "urn-1", 3, "Corvex1"}, {"Palm", "", 0, "Corvex1"}})
-            .Succeeded());
-    NMX::TSubjectStoreId other;
-    EXPECT_TRUE(editor->Add(NMX::ESubjectKind::BasicObjects, "Crate", other).Succeeded());
-    EXPECT_TRUE(editor->Add(NMX::ESubjectKind::CharactersFromClusters, "Ada", other).Succeeded());
-    EXPECT_TRUE(editor->Commit().Succeeded());
+    Set(glove, Paths::SmartClusters(),
+        std::vector<NMX::SmartCluster>{{"Back", "urn-1", 3, "Corvex1"}, {"Palm", "", 0, "Corvex1"}});
+    Add(NMX::ESubjectKind::BasicObjects, "Crate");
+    Add(NMX::ESubjectKind::CharactersFromClusters, "Ada");
   }
 
-  std::shared_ptr<Store::VStore> store = NMX::MakeShared<Store::VStore>();
   std::shared_ptr<StrictMock<MockControls>> controls = std::make_shared<StrictMock<MockControls>>();
   std::shared_ptr<Locations> locations = std::make_shared<Locations>();
   std::shared_ptr<NMX::ISmartObjectServices> service =
       NMX::MakeShared<SmartObjectServices::VSmartObjectServices>(store, controls, locations);
-  NMX::TSubjectStoreId glove;
+  const Id glove = Add(NMX::ESubjectKind::SmartObjects, "Glove");
 };
 
 }

@@ -2,11 +2,8 @@
 
 #include "StandaloneHost/Evaluation/ConfusionWarnings.h"
 #include "StandaloneHost/Evaluation/EvaluationSettings.h"
-#include "StandaloneHost/Store/IArchive.h"
-#include "StandaloneHost/Store/VStore.h"
-#include "StoreInterface/EntryPaths.h"
-#include "StoreInterface/TypedAccess.h"
 #include "tests/Support/LogCapture.h"
+#include "tests/Support/StoreFixture.h"
 
 #include <gmock/gmock.h>
 
@@ -52,26 +49,21 @@ Positions Crowd(unsigned number)
 
 constexpr std::uint32_t manyMarkers = 40;
 
-struct Archive : Store::IArchive
-{
-  Store::ChangeSet Load() override { return {{}, {}, Id(1)}; }
-  IResult Keep(const Store::ChangeSet&) override { return full ? EResult::DiskFull : EResult::Ok; }
-  std::atomic<bool> full = false;
-};
-
-class ObjectEvaluationEngineTest : public testing::Test
+class ObjectEvaluationEngineTest : public StoreFixture
 {
 protected:
   ~ObjectEvaluationEngineTest() override { engine->Stop(); }
 
   Id Add(const char* name, Positions markers, ESubjectKind kind = ESubjectKind::BasicObjects)
   {
-    const auto editor = store->Editor();
     Id id;
-    EXPECT_TRUE(editor->Add(kind, name, id).Succeeded());
-    const auto path = kind == ESubjectKind::BasicObjects ? Paths::Markers() : Paths::AdditionalMarkerPositions();
-    EXPECT_TRUE(editor->SetValue(id, path, std::move(markers)).Succeeded());
-    EXPECT_TRUE(editor->Commit().Succeeded());
+    Change(
+        [&](NMX::IEntryEditor& editor)
+        {
+          EXPECT_TRUE(editor.Add(kind, name, id).Succeeded());
+          const auto path = kind == ESubjectKind::BasicObjects ? Paths::Markers() : Paths::AdditionalMarkerPositions();
+          EXPECT_TRUE(editor.SetValue(id, path, std::move(markers)).Succeeded());
+        });
     return id;
   }
 
@@ -80,13 +72,6 @@ protected:
     const auto editor = store->Editor();
     EXPECT_TRUE(editor->SetValue(id, path, std::move(value)).Succeeded());
     return editor->Commit();
-  }
-
-  void Remove(Id id)
-  {
-    const auto editor = store->Editor();
-    EXPECT_TRUE(editor->Remove(id).Succeeded());
-    EXPECT_TRUE(editor->Commit().Succeeded());
   }
 
   /// "-", "possible", "likely", or what should never be.
@@ -136,8 +121,6 @@ protected:
     return distance;
   }
 
-  Archive& archive = *new Archive;
-  std::shared_ptr<Store::VStore> store = NMX::MakeShared<Store::VStore>(std::unique_ptr<Store::IArchive>(&archive));
   std::shared_ptr<VObjectEvaluationEngine> engine = NMX::MakeShared<VObjectEvaluationEngine>(store);
 };
 

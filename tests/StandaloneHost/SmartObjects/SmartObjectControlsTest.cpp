@@ -2,12 +2,9 @@
 
 #include "StandaloneHost/SmartObjects/AutoPatternManagement.h"
 #include "StandaloneHost/SmartObjects/PatternSets.h"
-#include "StandaloneHost/Store/IArchive.h"
-#include "StandaloneHost/Store/VStore.h"
-#include "StoreInterface/EntryPaths.h"
-#include "StoreInterface/TypedAccess.h"
 #include "tests/Support/LogCapture.h"
 #include "tests/Support/ManualPostal.h"
+#include "tests/Support/StoreFixture.h"
 #include "tests/Support/TemporaryFolder.h"
 
 #include <gmock/gmock.h>
@@ -27,19 +24,7 @@ namespace Paths = NMX::Paths;
 namespace
 {
 
-struct Archive : Store::IArchive
-{
-  Store::ChangeSet Load() override { return {{}, {}, Id(1)}; }
-  IResult Keep(const Store::ChangeSet&) override
-  {
-    ++commits;
-    return full ? EResult::DiskFull : EResult::Ok;
-  }
-  int commits = 0;
-  bool full = false;
-};
-
-class SmartObjectControlsTest : public testing::Test
+class SmartObjectControlsTest : public StoreFixture
 {
 protected:
   SmartObjectControlsTest()
@@ -51,19 +36,12 @@ protected:
 
   void AddObject(const std::string& name, std::vector<NMX::SmartCluster> clusters)
   {
-    const auto editor = store->Editor();
-    Id id;
-    ASSERT_TRUE(editor->Add(NMX::ESubjectKind::SmartObjects, name, id).Succeeded());
-    ASSERT_TRUE(editor->SetValue(id, Paths::SmartClusters(), std::move(clusters)).Succeeded());
-    ASSERT_TRUE(editor->Commit().Succeeded());
+    Set(Add(NMX::ESubjectKind::SmartObjects, name), Paths::SmartClusters(), std::move(clusters));
   }
 
   void AddDevice(const std::string& urn, const std::string& type)
   {
-    const auto editor = store->Editor();
-    const NMX::EntryPath path("Application/Devices/" + urn + "/Type");
-    ASSERT_TRUE(editor->SetApplicationEntry(path, type).Succeeded());
-    ASSERT_TRUE(editor->Commit().Succeeded());
+    SetApplication("Application/Devices/" + urn + "/Type", type);
   }
 
   std::vector<std::uint32_t> Patterns() const
@@ -92,8 +70,6 @@ protected:
   }
 
   const TemporaryFolder folder;
-  Archive& archive = *new Archive;
-  std::shared_ptr<Store::VStore> store = NMX::MakeShared<Store::VStore>(std::unique_ptr<Store::IArchive>(&archive));
   std::shared_ptr<SmartObjects::DeviceLayouts> layouts = std::make_shared<SmartObjects::DeviceLayouts>();
   std::shared_ptr<SmartObjects::VSmartObjectControls> controls =
       std::make_shared<SmartObjects::VSmartObjectControls>(store, layouts);

@@ -65,7 +65,7 @@ TEST_F(ArchiveTest, KeepsEveryTypeOfValueExactly)
   TSubjectStoreId glove, ada, body, deleted;
   const std::vector<std::pair<NMX::EntryPath, NMX::Value>> gloveValues{
       {Paths::Enabled(), false},
-      {Paths::AutoAssignedName(), std::string("Left \"hand\"\n\xC3\xA9")},
+      {Paths::PresetName(), std::string("Left \"hand\"\n\xC3\xA9")},
       {Paths::ColourRGBA(), NMX::Colour{1, 2, 3, 4}},
       {Paths::AdditionalMarkerPositions(), std::vector<NMX::Position>{{0.1, -2.5e-7, 1e300}, {}}},
       {Paths::SmartClusters(), std::vector<NMX::SmartCluster>{{"A", "urn:1", 4294967295U, "Corvex1"}, {}}},

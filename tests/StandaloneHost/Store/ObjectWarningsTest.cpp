@@ -1,6 +1,4 @@
-#include "StandaloneHost/Store/VStore.h"
-#include "StoreInterface/EntryPaths.h"
-#include "StoreInterface/TypedAccess.h"
+#include "tests/Support/StoreFixture.h"
 
 #include <gmock/gmock.h>
 
@@ -33,39 +31,14 @@ constexpr std::array derived{"DuplicateDevice",
 
 using Warnings = std::set<std::string>;
 
-class ObjectWarningsTest : public testing::Test
+class ObjectWarningsTest : public StoreFixture
 {
 protected:
-  /// One edit.
-  template <class Edit>
-  void Change(Edit edit)
-  {
-    const auto editor = store->Editor();
-    edit(*editor);
-    ASSERT_TRUE(editor->Commit().Succeeded());
-  }
-
-  Id Add(const char* name, ESubjectKind kind = ESubjectKind::SmartObjects)
-  {
-    Id id;
-    Change([&](NMX::IEntryEditor& editor) { EXPECT_TRUE(editor.Add(kind, name, id).Succeeded()); });
-    return id;
-  }
-
-  void Set(Id id, NMX::EntryPath path, NMX::Value value)
-  {
-    Change([&](NMX::IEntryEditor& editor) { EXPECT_TRUE(editor.SetValue(id, path, std::move(value)).Succeeded()); });
-  }
+  Id Add(const char* name, ESubjectKind kind = ESubjectKind::SmartObjects) { return StoreFixture::Add(kind, name); }
 
   void SetClusters(Id id, std::vector<NMX::SmartCluster> clusters)
   {
     Set(id, Paths::SmartClusters(), std::move(clusters));
-  }
-
-  void SetApplication(const std::string& path, NMX::Value value)
-  {
-    Change([&](NMX::IEntryEditor& editor)
-           { EXPECT_TRUE(editor.SetApplicationEntry(NMX::EntryPath(path), std::move(value)).Succeeded()); });
   }
 
   /// A device of the stage; none when `connected` is not given.
@@ -98,8 +71,6 @@ protected:
     }
     return warnings;
   }
-
-  std::shared_ptr<Store::VStore> store = NMX::MakeShared<Store::VStore>();
 };
 
 }

@@ -1,11 +1,9 @@
 #include "StandaloneHost/Store/VStore.h"
 
 #include "HostInterface/DebugServices/CallAssertFailHandler.h"
-#include "StandaloneHost/Store/IArchive.h"
-#include "StoreInterface/EntryPaths.h"
-#include "StoreInterface/TypedAccess.h"
 #include "tests/Support/LogCapture.h"
 #include "tests/Support/ManualPostal.h"
+#include "tests/Support/StoreFixture.h"
 
 #include <gmock/gmock.h>
 
@@ -23,41 +21,15 @@ namespace Paths = NMX::Paths;
 namespace
 {
 
-class StoreTest : public testing::Test
+class StoreTest : public StoreFixture
 {
 protected:
-  TSubjectStoreId Add(ESubjectKind kind, std::string_view name)
-  {
-    TSubjectStoreId id;
-    const auto editor = store->Editor();
-    EXPECT_TRUE(editor->Add(kind, name, id).Succeeded()) << name;
-    EXPECT_TRUE(editor->Commit().Succeeded());
-    return id;
-  }
-
-  void Set(TSubjectStoreId id, NMX::EntryPath path, NMX::Value value)
-  {
-    const auto editor = store->Editor();
-    EXPECT_TRUE(editor->SetValue(id, path, std::move(value)).Succeeded());
-    EXPECT_TRUE(editor->Commit().Succeeded());
-  }
-
-  template <class T>
-  T Get(TSubjectStoreId id, NMX::EntryPath path)
-  {
-    T value{};
-    EXPECT_TRUE(NMX::Read(*store->Reader(), id, path, value).Succeeded()) << path;
-    return value;
-  }
-
   NMX::ChangeStamps Stamps(TSubjectStoreId id)
   {
     NMX::ChangeStamps stamps{};
     EXPECT_TRUE(store->Reader()->Stamps(id, stamps).Succeeded());
     return stamps;
   }
-
-  std::shared_ptr<Store::VStore> store = NMX::MakeShared<Store::VStore>();
 };
 
 }
@@ -129,13 +101,11 @@ TEST_F(StoreTest, TypedReadsTellApartWhatIsMissingEmptyAndOfAnotherType)
   std::string text;
   bool flag = false;
   EXPECT_EQ(NMX::Read(*reader, id, Paths::FilePath(), wide), IResult(EResult::NotFound));
-  EXPECT_EQ(NMX::Read(*reader, id, Paths::AutoAssignedName(), text), IResult(EResult::NotSet));
   EXPECT_EQ(NMX::Read(*reader, id, Paths::Parameters(), text), IResult(EResult::NotSet));
   EXPECT_EQ(NMX::Read(*reader, id, Paths::Name(), flag), IResult(EResult::InvalidType));
   EXPECT_EQ(NMX::Read(*reader, TSubjectStoreId(99), Paths::Name(), text), IResult(EResult::InvalidId));
   EXPECT_EQ(wide, L"untouched");
   EXPECT_THAT(log.messages, ElementsAre("Store entry 'Parameters/FilePath' does not exist.",
-                                        "Store entry 'Parameters/AutoAssignedName' has no value.",
                                         "Store entry 'Parameters' has no value."));
 }
 

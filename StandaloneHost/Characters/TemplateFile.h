@@ -1,0 +1,45 @@
+#pragma once
+
+#include "StandaloneHost/Files/ConfigurationError.h"
+
+#include <filesystem>
+#include <string>
+#include <vector>
+
+namespace Characters
+{
+
+/// A segment of the skeleton that a character is made for.
+struct SegmentTemplate
+{
+  std::string name;
+  std::string parent; ///< one of the segments before it; empty for the root
+
+  friend bool operator==(const SegmentTemplate&, const SegmentTemplate&) = default;
+};
+
+/// A slot that a character starts with, and the segment that the object in it is worn on.
+struct SlotTemplate
+{
+  std::string name;
+  std::string segment;
+
+  friend bool operator==(const SlotTemplate&, const SlotTemplate&) = default;
+};
+
+/// What a new character starts with.
+struct CharacterTemplate
+{
+  std::vector<SegmentTemplate> segments; ///< 1 to 256, the root first; no two have the same name
+  std::vector<SlotTemplate> slots;       ///< 1 to 256; no two have the same name
+  bool solving = true;
+  bool retargeting = false;
+
+  friend bool operator==(const CharacterTemplate&, const CharacterTemplate&) = default;
+};
+
+/// Reads a template file. Throws Files::UnreadableFileError when the file itself cannot be read, and another
+/// Files::ConfigurationError when anything is wrong with its content. [any]
+[[nodiscard]] CharacterTemplate ReadTemplate(const std::filesystem::path& file);
+
+}

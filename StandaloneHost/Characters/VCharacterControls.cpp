@@ -1,0 +1,106 @@
+#include "StandaloneHost/Characters/VCharacterControls.h"
+
+#include "HostInterface/NMX/GlobalLog.h"
+#include "StandaloneHost/Characters/TemplateFile.h"
+#include "StoreInterface/CalibrationState.h"
+#include "StoreInterface/EntryPaths.h"
+
+#include <system_error>
+#include <utility>
+#include <vector>
+
+namespace Characters
+{
+
+using NMX::EResult;
+using NMX::IResult;
+using NMX::TSubjectStoreId;
+namespace Paths = NMX::Paths;
+
+namespace
+{
+
+/// Reads a template: the failures of ICharacterControls, with the reason in the log.
+IResult ReadTemplateFile(const std::filesystem::path& file, CharacterTemplate& content)
+{
+  const auto fail = [](const char* reason, EResult result)
+  {
+    NMX::Log(NMX::subjectStoreLog, NMX::ESeverity::Error, "The character template cannot be used: %1%", reason);
+    return result;
+  };
+  if (file.empty())
+    return EResult::InvalidArgument;
+  std::error_code error;
+  if (std::filesystem::status(file, error).type() == std::filesystem::file_type::not_found)
+    return EResult::FileNotFound;
+  try
+  {
+    content = ReadTemplate(file);
+    return EResult::Ok;
+  }
+  catch (const Files::UnreadableFileError& failure)
+  {
+    return fail(failure.what(), EResult::FileIOFailure);
+  }
+  catch (const Files::ConfigurationError& failure)
+  {
+    return fail(failure.what(), EResult::SerialisationFailure);
+  }
+}
+
+/// The template's slots, numbered from 1.
+std::vector<NMX::Slot> SlotsOf(const CharacterTemplate& content)
+{
+  std::vector<NMX::Slot> slots;
+  slots.reserve(content.slots.size());
+  for (const SlotTemplate& slot : content.slots)
+    slots.push_back({TSubjectStoreId(slots.size() + 1), slot.name});
+  return slots;
+}
+
+}
+
+VCharacterControls::VCharacterControls(std::shared_ptr<NMX::IStore> store,
+                                       std::shared_ptr<NMX::IAsioPostalService> postal,
+                                       std::chrono::milliseconds calibrationTime)
+    : m_runs(std::make_shared<CalibrationRuns>(std::move(store), std::move(postal), calibrationTime))
+{
+  m_runs->Resume();
+}
+
+void VCharacterControls::Stop()
+{
+  m_runs->Stop();
+}
+
+IResult VCharacterControls::CreateFromTemplate(NMX::IEntryEditor& access, const std::string& name,
+                                               const std::filesystem::path& file)
+{
+  TSubjectStoreId id;
+  if (const IResult added = access.Add(NMX::ESubjectKind::CharactersFromClusters, name, id); added.Failed())
+    return added;
+  CharacterTemplate content;
+  if (const IResult read = ReadTemplateFile(file, content); read.Failed())
+    return read;
+  if (const IResult set = access.SetValue(id, Paths::Slots(), SlotsOf(content)); set.Failed())
+    return set;
+  if (const IResult set = access.SetValue(id, Paths::RoleSolving(), content.solving); set.Failed())
+    return set;
+  return access.SetValue(id, Paths::RoleRetargeting(), content.retargeting);
+}
+
+IResult VCharacterControls::Calibrate(NMX::IEntryEditor& access, TSubjectStoreId character)
+{
+  const IResult set = access.SetValue(character, Paths::Calibration(), NMX::CalibrationState::running);
+  if (set.Succeeded())
+    m_runs->Start(character); // if the caller does not commit, the run ends without effect
+  return set;
+}
+
+IResult VCharacterControls::ClearCalibration(NMX::IEntryEditor& access, TSubjectStoreId character)
+{
+  // A run that finds the state cleared ends without effect.
+  return access.SetValue(character, Paths::Calibration(), NMX::CalibrationState::none);
+}
+
+}
