@@ -1,6 +1,7 @@
 // Finding one of 100,000 subjects by name and reading one entry, against a bare hash lookup of the same names; and what
 // an edit costs in stores of different size.
 
+#include "StandaloneHost/Store/IArchive.h"
 #include "StandaloneHost/Store/VStore.h"
 #include "StoreInterface/EntryPaths.h"
 #include "StoreInterface/TypedAccess.h"
@@ -129,9 +130,71 @@ void EditInAGroup(benchmark::State& state)
   }
 }
 
+/// Gives an object in one of a character's twenty slots a warning, and takes it away, while all other objects wait for
+/// a slot to become empty: the character's slots are looked at, and its own warning follows.
+void EditInASlot(benchmark::State& state)
+{
+  const auto store = MakeStore(static_cast<int>(state.range(0)));
+  {
+    const auto editor = store->Editor();
+    for (int i = 0; i < static_cast<int>(state.range(0)); ++i)
+    {
+      NMX::TSubjectStoreId id;
+      (void)editor->FindByName(Name(i), id);
+      (void)editor->SetValue(id, NMX::Paths::AutoAssignEnabled(), true);
+    }
+    std::vector<NMX::Slot> slots;
+    for (std::uint64_t slot = 1; slot <= 20; ++slot)
+      slots.push_back({NMX::TSubjectStoreId(slot), "Slot " + std::to_string(slot)});
+    NMX::TSubjectStoreId character;
+    (void)editor->Add(NMX::ESubjectKind::CharactersFromClusters, "Character", character);
+    (void)editor->SetValue(character, NMX::Paths::Slots(), std::move(slots));
+    (void)editor->Commit();
+  }
+  bool confused = true;
+  for (auto _ : state)
+  {
+    const auto editor = store->Editor();
+    NMX::TSubjectStoreId id;
+    (void)editor->FindByName(Name(10), id);
+    (void)editor->SetValue(id, NMX::Paths::WarningObjectConfusion(), confused);
+    (void)editor->Commit();
+    confused = !confused;
+  }
+}
+
+/// Opening a store that an archive holds: everything is derived afresh.
+void OpenStore(benchmark::State& state)
+{
+  struct Archive : Store::IArchive
+  {
+    explicit Archive(int subjects) : count(subjects) {}
+    Store::ChangeSet Load() override
+    {
+      Store::ChangeSet content;
+      for (int i = 1; i <= count; ++i)
+      {
+        const NMX::TSubjectStoreId id(i);
+        const auto kind = i % 10 == 0 ? NMX::ESubjectKind::CharactersFromClusters : NMX::ESubjectKind::BasicObjects;
+        content.subjects.emplace(
+            id, Store::ChangedSubject{std::make_unique<Store::SubjectRecord>(id, kind, Name(i)), kind});
+      }
+      content.nextId = NMX::TSubjectStoreId(count + 1);
+      return content;
+    }
+    NMX::IResult Keep(const Store::ChangeSet&) override { return NMX::EResult::DiskFull; }
+    int count;
+  };
+  for (auto _ : state)
+    benchmark::DoNotOptimize(
+        NMX::MakeShared<Store::VStore>(std::make_unique<Archive>(static_cast<int>(state.range(0)))));
+}
+
 }
 
 BENCHMARK(BareHashLookup);
 BENCHMARK(FindByNameAndRead);
 BENCHMARK(EditOneEntry)->Arg(100)->Arg(100000);
 BENCHMARK(EditInAGroup)->Arg(100)->Arg(100000);
+BENCHMARK(EditInASlot)->Arg(100)->Arg(100000);
+BENCHMARK(OpenStore)->Arg(10000)->Unit(benchmark::kMillisecond);

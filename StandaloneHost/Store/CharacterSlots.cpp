@@ -113,14 +113,14 @@ public:
       if (IsCharacter(m_draft.Find(id)))
         m_characters.insert(id);
     };
+    // A character that a subject left was changed by that.
     for (const auto& [id, change] : m_draft.Changes().subjects)
     {
       touch(id);
-      for (const SubjectRecord* record :
-           {static_cast<const SubjectRecord*>(change.record.get()), m_draft.Base().Find(id)})
-        if (record != nullptr)
-          touch(record->Parent());
-      if (change.record != nullptr && IsObject(*change.record))
+      if (change.record == nullptr)
+        continue;
+      touch(change.record->Parent());
+      if (IsObject(*change.record))
         m_objects.push_back(id);
     }
     TellOfChangedSlots();

@@ -176,6 +176,26 @@ TEST_F(CharacterSlotsTest, EmptySlotsAreFilledInTheOrderOfCharactersSlotsAndObje
   EXPECT_EQ(PlaceOf(third), (Place{prop, Id{}, ""}));
 }
 
+TEST_F(CharacterSlotsTest, WhatChangesInTheSameEditIsAssignedAsTheEditLeavesIt)
+{
+  const Id first = AddObject("First", true);
+  const Id removed = AddObject("Removed", true);
+  const Id manual = AddObject("Manual", true);
+  const Id last = AddObject("Last", true);
+  Id ada;
+  Change(
+      [&](NMX::IEntryEditor& editor)
+      {
+        EXPECT_TRUE(editor.Remove(removed).Succeeded());
+        EXPECT_TRUE(editor.SetValue(manual, Paths::AutoAssignEnabled(), false).Succeeded());
+        EXPECT_TRUE(editor.Add(ESubjectKind::CharactersFromClusters, "Ada", ada).Succeeded());
+        EXPECT_TRUE(editor.SetValue(ada, Paths::Slots(), NumberedSlots(3)).Succeeded());
+      });
+  EXPECT_EQ(PlaceOf(first), (Place{ada, Id(1), "Slot 1"}));
+  EXPECT_EQ(PlaceOf(last), (Place{ada, Id(2), "Slot 2"}));
+  EXPECT_EQ(PlaceOf(manual), nowhere);
+}
+
 TEST_F(CharacterSlotsTest, NothingIsAssignedInAHostWithoutAutoAssignment)
 {
   store = NMX::MakeShared<Store::VStore>(Store::DerivationRules{false});
@@ -213,6 +233,7 @@ TEST_F(CharacterSlotsTest, ASlotThatIsTakenOrDoesNotExistIsNobodys)
   EXPECT_EQ(PlaceOf(second), (Place{first, Id{}, ""}));
   Set(ada, Paths::Slots(), std::vector<NMX::Slot>{{Id(2), "Other"}, {Id(2), "Twice"}, {Id{}, "No id"}});
   EXPECT_EQ(PlaceOf(first), (Place{ada, Id{}, ""}));
+  EXPECT_TRUE(WarningsOf(ada).contains("CFCNoReferenceClusterAssigned")) << "a child in no slot is no reference";
   EXPECT_EQ(claim(second, ada, 2), (Place{ada, Id(2), ""}));
   EXPECT_FALSE(WarningsOf(ada).contains("EmptySlot"));
 }
@@ -262,7 +283,7 @@ class RandomStage
 public:
   static constexpr std::size_t characterCount = 50;
   static constexpr std::size_t slotCount = 20;
-  static constexpr std::size_t objectCount = 900;
+  static constexpr std::size_t objectCount = 1300;
 
   explicit RandomStage(unsigned seed) : m_random(seed) {}
 
