@@ -190,6 +190,8 @@ private:
   void FillSlots()
   {
     CurrentIds characters(m_draft, m_draft.Base().AwaitingObjects(), AwaitsObjects);
+    if (characters.Empty())
+      return;
     CurrentIds objects(m_draft, m_draft.Base().AutoAssignable(), IsAutoAssignable);
     while (!characters.Empty() && !objects.Empty())
     {
@@ -254,11 +256,12 @@ private:
 
   static bool AutoAssigned(const SubjectRecord& object) { return Value<bool>(object, Paths::AutoAssignEnabled()); }
 
-  void SetAutoAssignedName(const SubjectRecord& object, std::string name)
+  void SetAutoAssignedName(const SubjectRecord& object, const std::string& name)
   {
     const SchemaEntry& entry = *object.schema->Find(Paths::AutoAssignedName());
-    if (object.Get(entry) != NMX::Value(name))
-      m_draft.Change(object.id, NMX::EAspect::Parameters).Set(entry, std::move(name));
+    const auto* current = std::get_if<std::string>(&object.Get(entry));
+    if (current == nullptr || *current != name)
+      m_draft.Change(object.id, NMX::EAspect::Parameters).Set(entry, name);
   }
 
   void SetBits(Id id, std::uint64_t mask, std::uint64_t bits)

@@ -47,10 +47,10 @@ export function outputs(record) {
   return record.arguments.filter(argument => argument.direction === 'output');
 }
 
-// The failures that a function documents: [name, text].
+// The failures that a function documents: [name, text]. One code is spelt in two ways.
 export function documentedFailures(record) {
   return record.results.split('\n').filter(line => line !== '' && !line.startsWith('Ok - '))
-    .map(line => line.split(/ - (.*)/, 2));
+    .map(line => line.replace(/^Serialization/, 'Serialisation').split(/ - (.*)/, 2));
 }
 
 // The error member of a failed call.

@@ -75,8 +75,10 @@ function within(name, content) {
   return content && `<${name}>${content}</${name}>`;
 }
 
-// Where in a subject its markers and clusters stand.
-function partsOf(kind, markers, clusters) {
+// Where in a subject its markers, clusters and slots stand.
+function partsOf(kind, markers, clusters, slots) {
+  if (kind === 'CFCs')
+    return within('Slots', slots.map(slot => leaf('Slot', typeof slot === 'string' ? { name: slot } : slot)).join(''));
   const positions = markers.map(([x, y, z]) => leaf('Marker', { x, y, z })).join('');
   if (kind !== 'SmartObjects')
     return within('Markers', positions);
@@ -85,16 +87,18 @@ function partsOf(kind, markers, clusters) {
   return within('SmartObject', within('AdditionalMarkerPositions', positions) + within('SmartClusters', made.join('')));
 }
 
-// The text of a subject configuration. A subject: { kind, name, parameters, warnings, markers, clusters }; the name is
-// enough. A cluster: { label, device, pattern, type }, of which each may be left out. A device: its attributes; the URN
-// is enough.
+// The text of a subject configuration. A subject: { kind, name, parent, parameters, warnings, markers, clusters,
+// slots }; the name is enough. A cluster: { label, device, pattern, type }, of which each may be left out. A slot:
+// { name, object }, or its name. A device: its attributes; the URN is enough.
 export function configuration(subjects, devices = []) {
   const lines = subjects.map(subject => {
-    const { kind = 'BasicObjects', name, parameters = {}, warnings = [], markers = [], clusters = [] } = subject;
+    const { kind = 'BasicObjects', name, parent, parameters = {}, warnings = [], markers = [], clusters = [],
+            slots = [] } = subject;
+    const of = parent === undefined ? '' : ` parent="${escaped(parent)}"`;
     const content = group('Parameters', Object.entries(parameters)) +
                     group('Warnings', warnings.map(warning => [`Warning${warning}`, true])) +
-                    partsOf(kind, markers, clusters);
-    return `    <Subject kind="${kind}" name="${escaped(name)}">${content}</Subject>`;
+                    partsOf(kind, markers, clusters, slots);
+    return `    <Subject kind="${kind}" name="${escaped(name)}"${of}>${content}</Subject>`;
   });
   const usual = { type: 'Corvex1', connected: true, charging: false, battery: 50, radio: 11 };
   const stage = devices.map(device => leaf('Device', { ...usual, ...device })).join('');

@@ -82,8 +82,7 @@ const staff = temporaryFile('Stäbe 🧰.sot', sot(clusters('Griff ä', 'Tip') +
 const subjects = [
   { name: 'Crate' }, { kind: 'CFCs', name: 'Actor' },
   { ...smart('Sword', { label: 'Hilt', device: 'corvex1-1', pattern: 2 }),
-    parameters: { ColourRGBA: '#80102030', ProximityGroupName: 'Stage left', AutoAssignedName: 'Left hand',
-                  AutoAssignEnabled: true } },
+    parameters: { ColourRGBA: '#80102030', ProximityGroupName: 'Stage left', AutoAssignEnabled: true } },
 ];
 const devices = [{ urn: 'corvex1-1' }, { urn: 'corvex1-2', radio: 12 }];
 const texts = new Map(published.enumerations.find(({ name }) => name === `${group}.ESmartObjectWarning`).values
@@ -118,7 +117,7 @@ const walk = [
   ['ActiveMarkersOnWhileCharging', ['Sword'], { OnWhileCharging: false }],
   ['SetActiveMarkersOnWhileCharging', ['Sword', true], {}, 1],
   ['ActiveMarkersOnWhileCharging', ['Sword'], { OnWhileCharging: true }],
-  ['AutoAssignedName', ['Sword'], { AutoAssignedName: 'Left hand' }], ['SetAutoAssignEnabled', ['Axe', true], {}, 1],
+  ['AutoAssignedName', ['Sword'], { AutoAssignedName: '' }], ['SetAutoAssignEnabled', ['Axe', true], {}, 1],
   ['AutoAssignEnabled', ['Axe'], { Enabled: true }],
   ['ProximityGroupName', ['Sword'], { ProximityGroupName: 'Stage left' }],
   ['SetProximityGroupName', ['Sword', 'Bühne'], {}, 1],
