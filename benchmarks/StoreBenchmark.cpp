@@ -9,6 +9,7 @@
 #include <benchmark/benchmark.h>
 #include <boost/unordered/unordered_flat_map.hpp>
 
+#include <cstdlib>
 #include <random>
 #include <string>
 #include <vector>
@@ -163,26 +164,42 @@ void EditInASlot(benchmark::State& state)
   }
 }
 
-/// Opening a store that an archive holds: everything is derived afresh.
+/// What an archive holds: ten objects for each character.
+Store::ChangeSet ArchiveContent(int count)
+{
+  Store::ChangeSet content;
+  for (int i = 1; i <= count; ++i)
+  {
+    const NMX::TSubjectStoreId id(i);
+    const auto kind = i % 11 == 0 ? NMX::ESubjectKind::CharactersFromClusters : NMX::ESubjectKind::BasicObjects;
+    auto record = std::make_unique<Store::SubjectRecord>(id, kind, Name(i));
+    if (kind == NMX::ESubjectKind::CharactersFromClusters) // what would be derived, so that there is nothing to keep
+      record->bits |= Store::KindSchema::CharacterBit(NMX::Paths::WarningNotCalibrated()) |
+                      Store::KindSchema::CharacterBit(NMX::Paths::WarningCFCNoReferenceClusterAssigned());
+    content.subjects.emplace(id, Store::ChangedSubject{std::move(record), kind});
+  }
+  content.nextId = NMX::TSubjectStoreId(count + 1);
+  return content;
+}
+
+void TakeOver(benchmark::State& state)
+{
+  for (auto _ : state)
+  {
+    Store::StoreState content;
+    content.Apply(ArchiveContent(static_cast<int>(state.range(0))));
+    benchmark::DoNotOptimize(content);
+  }
+}
+
+/// The same, and everything is derived afresh.
 void OpenStore(benchmark::State& state)
 {
   struct Archive : Store::IArchive
   {
     explicit Archive(int subjects) : count(subjects) {}
-    Store::ChangeSet Load() override
-    {
-      Store::ChangeSet content;
-      for (int i = 1; i <= count; ++i)
-      {
-        const NMX::TSubjectStoreId id(i);
-        const auto kind = i % 10 == 0 ? NMX::ESubjectKind::CharactersFromClusters : NMX::ESubjectKind::BasicObjects;
-        content.subjects.emplace(
-            id, Store::ChangedSubject{std::make_unique<Store::SubjectRecord>(id, kind, Name(i)), kind});
-      }
-      content.nextId = NMX::TSubjectStoreId(count + 1);
-      return content;
-    }
-    NMX::IResult Keep(const Store::ChangeSet&) override { return NMX::EResult::DiskFull; }
+    Store::ChangeSet Load() override { return ArchiveContent(count); }
+    NMX::IResult Keep(const Store::ChangeSet&) override { std::abort(); }
     int count;
   };
   for (auto _ : state)
@@ -197,4 +214,5 @@ BENCHMARK(FindByNameAndRead);
 BENCHMARK(EditOneEntry)->Arg(100)->Arg(100000);
 BENCHMARK(EditInAGroup)->Arg(100)->Arg(100000);
 BENCHMARK(EditInASlot)->Arg(100)->Arg(100000);
+BENCHMARK(TakeOver)->Arg(10000)->Unit(benchmark::kMillisecond);
 BENCHMARK(OpenStore)->Arg(10000)->Unit(benchmark::kMillisecond);
