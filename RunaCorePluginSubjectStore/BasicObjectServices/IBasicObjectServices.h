@@ -64,7 +64,7 @@ public:
   virtual IResult AutoAssignEnabled(const std::string& name, bool& enabled) const = 0;
   virtual IResult SetAutoAssignEnabled(const std::string& name, bool enabled) = 0;
 
-  /// The name of the character slot that the object is in, under which it is output then; empty unless it is in one
+  /// The name of the character slot that the object is in, under which it is output then. `NotSet` unless it is in one
   /// and auto-assign is enabled for it.
   virtual IResult AutoAssignedName(const std::string& name, std::string& autoAssignedName) const = 0;
 

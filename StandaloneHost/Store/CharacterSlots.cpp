@@ -238,7 +238,7 @@ private:
       const SubjectRecord& object = *m_draft.Find(child);
       const auto slot = positions.find(object.ParentSlot());
       if (IsObject(object) && slot != positions.end())
-        SetAutoAssignedName(object, m_autoAssign && AutoAssigned(object) ? slots[slot->second].name : std::string{});
+        SetAutoAssignedName(object, m_autoAssign && AutoAssigned(object) ? &slots[slot->second].name : nullptr);
     }
   }
 
@@ -251,17 +251,19 @@ private:
       return;
     if (object.ParentSlot().Valid())
       m_draft.MoveUnder(id, object.Parent());
-    SetAutoAssignedName(*m_draft.Find(id), {});
+    SetAutoAssignedName(*m_draft.Find(id), nullptr);
   }
 
   static bool AutoAssigned(const SubjectRecord& object) { return Value<bool>(object, Paths::AutoAssignEnabled()); }
 
-  void SetAutoAssignedName(const SubjectRecord& object, const std::string& name)
+  /// Without a name, the entry is left without a value.
+  void SetAutoAssignedName(const SubjectRecord& object, const std::string* name)
   {
     const SchemaEntry& entry = *object.schema->Find(Paths::AutoAssignedName());
     const auto* current = std::get_if<std::string>(&object.Get(entry));
-    if (current == nullptr || *current != name)
-      m_draft.Change(object.id, NMX::EAspect::Parameters).Set(entry, name);
+    if (name == nullptr ? current != nullptr : current == nullptr || *current != *name)
+      m_draft.Change(object.id, NMX::EAspect::Parameters)
+          .Set(entry, name != nullptr ? NMX::Value(*name) : NMX::Value{});
   }
 
   void SetBits(Id id, std::uint64_t mask, std::uint64_t bits)

@@ -18,7 +18,7 @@ namespace Store
 /// - With `autoAssign`, the empty slots of enabled characters are filled by auto-assignable objects: characters in the
 ///   order in which they were added, their slots in order, by the objects in the order in which they were added. What
 ///   is in a slot stays there.
-/// - An object in a slot, with auto-assign enabled, has the slot's name as its auto-assigned name.
+/// - An object in a slot, with auto-assign enabled, has the slot's name as its auto-assigned name; others have none.
 /// - The warnings of characters follow: of empty slots and of warnings on the objects in them, of a missing
 ///   calibration, and with `autoAssign` of a missing reference cluster and missing objects.
 void DeriveCharacters(Draft& draft, bool autoAssign);

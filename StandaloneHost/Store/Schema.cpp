@@ -99,7 +99,7 @@ std::vector<Row> Rows()
       Group(all, Paths::Roles()),
       Group(all, Paths::Warnings()),
 
-      {basic | smart, Paths::AutoAssignedName(), EValueType::Text, std::string{}},
+      {basic | smart, Paths::AutoAssignedName(), EValueType::Text, {}},
       {basic | smart, Paths::AutoAssignEnabled(), EValueType::Bool, false},
       {basic | smart | cluster, Paths::ColourRGBA(), EValueType::Colour, NMX::Colour{}},
       {basic | smart, Paths::EntranceThreshold(), EValueType::UInt32, 0U},

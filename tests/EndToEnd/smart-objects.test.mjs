@@ -80,7 +80,7 @@ const staff = temporaryFile('Stäbe 🧰.sot', sot(clusters('Griff ä', 'Tip') +
   '<AdditionalMarkerPositions><Marker x="1.5" y="-2" z="1e1"/></AdditionalMarkerPositions>'));
 
 const subjects = [
-  { name: 'Crate' }, { kind: 'CFCs', name: 'Actor' },
+  { name: 'Crate' }, { kind: 'CFCs', name: 'Actor', slots: ['Belt'] },
   { ...smart('Sword', { label: 'Hilt', device: 'corvex1-1', pattern: 2 }),
     parameters: { ColourRGBA: '#80102030', ProximityGroupName: 'Stage left', AutoAssignEnabled: true } },
 ];
@@ -117,7 +117,7 @@ const walk = [
   ['ActiveMarkersOnWhileCharging', ['Sword'], { OnWhileCharging: false }],
   ['SetActiveMarkersOnWhileCharging', ['Sword', true], {}, 1],
   ['ActiveMarkersOnWhileCharging', ['Sword'], { OnWhileCharging: true }],
-  ['AutoAssignedName', ['Sword'], { AutoAssignedName: '' }], ['SetAutoAssignEnabled', ['Axe', true], {}, 1],
+  ['AutoAssignedName', ['Sword'], { AutoAssignedName: 'Belt' }], ['SetAutoAssignEnabled', ['Axe', true], {}, 1],
   ['AutoAssignEnabled', ['Axe'], { Enabled: true }],
   ['ProximityGroupName', ['Sword'], { ProximityGroupName: 'Stage left' }],
   ['SetProximityGroupName', ['Sword', 'Bühne'], {}, 1],

@@ -44,7 +44,7 @@ struct Place
 {
   Id character;
   Id slot;
-  std::string name; ///< the auto-assigned one
+  std::string name; ///< the auto-assigned one; empty when it has none
 
   friend bool operator==(const Place&, const Place&) = default;
 };
@@ -54,7 +54,8 @@ Place PlaceOf(const NMX::IStoreReader& reader, Id object)
   Place place;
   EXPECT_TRUE(NMX::Read(reader, object, Paths::ParentSubjectId(), place.character).Succeeded());
   EXPECT_TRUE(NMX::Read(reader, object, Paths::ParentSubjectSlotId(), place.slot).Succeeded());
-  EXPECT_TRUE(NMX::Read(reader, object, Paths::AutoAssignedName(), place.name).Succeeded());
+  const NMX::IResult named = NMX::Read(reader, object, Paths::AutoAssignedName(), place.name);
+  EXPECT_TRUE(named.Succeeded() ? !place.name.empty() : named == NMX::EResult::NotSet) << named.Name();
   return place;
 }
 

@@ -101,11 +101,13 @@ TEST_F(StoreTest, TypedReadsTellApartWhatIsMissingEmptyAndOfAnotherType)
   std::string text;
   bool flag = false;
   EXPECT_EQ(NMX::Read(*reader, id, Paths::FilePath(), wide), IResult(EResult::NotFound));
+  EXPECT_EQ(NMX::Read(*reader, id, Paths::AutoAssignedName(), text), IResult(EResult::NotSet));
   EXPECT_EQ(NMX::Read(*reader, id, Paths::Parameters(), text), IResult(EResult::NotSet));
   EXPECT_EQ(NMX::Read(*reader, id, Paths::Name(), flag), IResult(EResult::InvalidType));
   EXPECT_EQ(NMX::Read(*reader, TSubjectStoreId(99), Paths::Name(), text), IResult(EResult::InvalidId));
   EXPECT_EQ(wide, L"untouched");
   EXPECT_THAT(log.messages, ElementsAre("Store entry 'Parameters/FilePath' does not exist.",
+                                        "Store entry 'Parameters/AutoAssignedName' has no value.",
                                         "Store entry 'Parameters' has no value."));
 }
 
