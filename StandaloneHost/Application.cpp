@@ -2,12 +2,15 @@
 
 #include "HostInterface/NMX/GlobalLog.h"
 #include "HostInterface/NotificationSystem/VAsioPostalServiceStrand.h"
+#include "HostInterface/RunaCorePluginInterface/IAccessRights.h"
+#include "StandaloneHost/Calibration/VCalibrationProvider.h"
 #include "StandaloneHost/Characters/VCharacterControls.h"
 #include "StandaloneHost/Evaluation/VObjectEvaluationEngine.h"
 #include "StandaloneHost/Files/SubjectConfiguration.h"
 #include "StandaloneHost/PluginModule.h"
 #include "StandaloneHost/Postal/VAsioPostalService.h"
 #include "StandaloneHost/Server/VServer.h"
+#include "StandaloneHost/Settings/PanelSettings.h"
 #include "StandaloneHost/Simulation/HostSimulation.h"
 #include "StandaloneHost/SmartObjects/AutoPatternManagement.h"
 #include "StandaloneHost/SmartObjects/VSmartObjectControls.h"
@@ -53,6 +56,23 @@ void LoadConfigurations(Store::VStore& store, const Options& options)
            loaded.devices, loaded.presets);
 }
 
+void SetUpSettings(Store::VStore& store, const VFileLocations& locations)
+{
+  const NMX::IResult set = Settings::SetUpPanelSettings(
+      store,
+      {locations.Folders("CharacterTemplates"), locations.Folders("SmartObjectTemplates"),
+       locations.Folders("LabellingTemplates"), locations.Folders("SubjectSkins"), locations.Folders("Retargets")});
+  if (set.Failed())
+    NMX::Log(NMX::systemLog, NMX::ESeverity::Error, "The settings cannot be brought up to date: %1%", set.Name());
+}
+
+/// Everything is open to everybody: who may connect at all is the server's business.
+class OpenToAll final : public RunaCorePluginInterface::IAccessRights
+{
+public:
+  [[nodiscard]] bool Granted(std::uint32_t /*right*/) const override { return true; }
+};
+
 /// Tells whoever started the host that calls are served. The file appears whole.
 void WriteReadyFile(const std::filesystem::path& file, const std::string& address)
 {
@@ -91,12 +111,14 @@ std::shared_ptr<Evaluation::VObjectEvaluationEngine> StartEvaluation(const std::
 }
 
 /// The order matters: clients go first, then what serves them, then the plugin, and the store last.
-void Stop(Server::VServer& server, Characters::VCharacterControls& characters, Postal::VAsioPostalService& postal,
+void Stop(Server::VServer& server, Characters::VCharacterControls& characters,
+          Calibration::VCalibrationProvider& calibration, Postal::VAsioPostalService& postal,
           Evaluation::VObjectEvaluationEngine* evaluation, PluginPointer plugin, std::shared_ptr<Store::VStore> store)
 {
   server.Close();    // no client, no outstanding call, no function any more
   characters.Stop(); // the timers that would keep the postal service busy are gone
-  postal.Stop();     // the strands have run empty
+  calibration.Stop();
+  postal.Stop(); // the strands have run empty
   if (evaluation != nullptr)
     evaluation->Stop(); // nobody edits the store any more
   plugin->UnregisterQml();
@@ -110,6 +132,8 @@ void RunApplication(const Options& options)
 {
   auto store = OpenStore(options);
   LoadConfigurations(*store, options);
+  const auto locations = std::make_shared<VFileLocations>(options.dataFolder);
+  SetUpSettings(*store, *locations);
   PluginPointer plugin = LoadPlugin(options.pluginFile.empty() ? OwnPluginFile() : options.pluginFile);
 
   const auto postal = NMX::MakeShared<Postal::VAsioPostalService>();
@@ -119,18 +143,22 @@ void RunApplication(const Options& options)
   const auto smartObjects = std::make_shared<SmartObjects::VSmartObjectControls>(store, layouts);
   const auto characters =
       std::make_shared<Characters::VCharacterControls>(store, postal, options.characterCalibrationTime);
+  const auto calibration =
+      std::make_shared<Calibration::VCalibrationProvider>(store, postal, options.subjectCalibrationTimes);
+  // What follows the store's changes has strands of its own.
+  const auto patternStrand = NMX::MakeShared<NotificationSystem::VAsioPostalServiceStrand>(postal);
+  const auto calibrationStrand = NMX::MakeShared<NotificationSystem::VAsioPostalServiceStrand>(postal);
   std::shared_ptr<const void> patternManagement;
   try
   {
     const auto settings = std::make_shared<VPluginSettings>(
-        options.features,
-        HostSettings{std::make_shared<VFileLocations>(options.dataFolder), smartObjects, evaluation, characters});
-    VPluginHost host({store, postal, server, settings, layouts});
+        options.features, HostSettings{locations, smartObjects, evaluation, characters});
+    VPluginHost host({store, postal, server, settings, layouts, calibration, std::make_shared<OpenToAll>()});
     (void)plugin->RegisterServices(host);
     Simulation::RegisterGroup(*server, store, NMX::MakeShared<NotificationSystem::VAsioPostalServiceStrand>(postal));
     plugin->RegistrationFinished();
-    patternManagement = SmartObjects::ManagePatterns(
-        store, smartObjects, NMX::MakeShared<NotificationSystem::VAsioPostalServiceStrand>(postal));
+    patternManagement = SmartObjects::ManagePatterns(store, smartObjects, patternStrand);
+    calibration->Open(calibrationStrand);
     server->Open();
     WriteReadyFile(options.readyFile, server->Address());
     std::printf("listening on http://%s and ws://%s/rpc\n", server->Address().c_str(), server->Address().c_str());
@@ -139,8 +167,8 @@ void RunApplication(const Options& options)
   }
   catch (...)
   {
-    Stop(*server, *characters, *postal, evaluation.get(), std::move(plugin), std::move(store));
+    Stop(*server, *characters, *calibration, *postal, evaluation.get(), std::move(plugin), std::move(store));
     throw;
   }
-  Stop(*server, *characters, *postal, evaluation.get(), std::move(plugin), std::move(store));
+  Stop(*server, *characters, *calibration, *postal, evaluation.get(), std::move(plugin), std::move(store));
 }

@@ -122,6 +122,9 @@ po::options_description Description()
       ("level", text("2"), "2, or 1 to open the preview functions as well")                    //
       ("character-calibration-time", text("3000"),
        "how long the calibration of a character takes, in ms")                                     //
+      ("t-pose-time", text("60000"), "how long a subject calibration waits for the T-pose, in ms") //
+      ("subject-calibration-time", text("10000"),
+       "how long a subject calibration goes on after the T-pose, in ms")                           //
       ("headless", "no window")                                                                    //
       ("ready-file", po::value<std::string>(), "file to write once calls are served")              //
       ("plugin-file", po::value<std::string>(), "plugin module to load (default: the host's own)") //
@@ -185,8 +188,10 @@ Request ReadOptions(int argumentCount, const char* const* arguments)
   options.server.grantedLevel = ParseNumber<std::uint32_t>(given("level"), "level");
   if (options.server.grantedLevel != 1 && options.server.grantedLevel != 2)
     throw OptionError("--level: expected 1 or 2, got " + Quoted(given("level")));
-  options.characterCalibrationTime = std::chrono::milliseconds(
-      ParseNumber<std::uint32_t>(given("character-calibration-time"), "character-calibration-time"));
+  const auto time = [&](const char* name)
+  { return std::chrono::milliseconds(ParseNumber<std::uint32_t>(given(name), name)); };
+  options.characterCalibrationTime = time("character-calibration-time");
+  options.subjectCalibrationTimes = {time("t-pose-time"), time("subject-calibration-time")};
   options.headless = values.count("headless") != 0;
   options.readyFile = given("ready-file");
   options.pluginFile = given("plugin-file");

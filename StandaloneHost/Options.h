@@ -1,6 +1,7 @@
 #pragma once
 
 #include "HostInterface/NMX/GlobalLog.h"
+#include "StandaloneHost/Calibration/VSubjectCalibrationController.h"
 #include "StandaloneHost/Server/VServer.h"
 
 #include <chrono>
@@ -26,6 +27,7 @@ struct Options
   Server::ServerOptions server;
   std::uint32_t features = 0xFFFFFFFF;
   std::chrono::milliseconds characterCalibrationTime{3000};
+  Calibration::CalibrationTimes subjectCalibrationTimes;
   bool headless = false;
   std::filesystem::path readyFile;  ///< empty: none
   std::filesystem::path pluginFile; ///< empty: the one that was built with the host

@@ -88,7 +88,7 @@ void VPluginHost::UndoManager(std::shared_ptr<IRunaCoreUndoManager>& undoManager
 
 void VPluginHost::CalibrationProvider(std::shared_ptr<ICalibrationProvider>& provider) const
 {
-  provider.reset();
+  provider = m_services.calibration;
 }
 
 void VPluginHost::OfflineStoreServices(std::shared_ptr<IOfflineStoreServices>& services) const
@@ -98,7 +98,7 @@ void VPluginHost::OfflineStoreServices(std::shared_ptr<IOfflineStoreServices>& s
 
 void VPluginHost::AccessRights(std::shared_ptr<IAccessRights>& rights) const
 {
-  rights.reset();
+  rights = m_services.accessRights;
 }
 
 VPluginSettings::VPluginSettings(std::uint32_t featureMask, HostSettings settings)
@@ -134,9 +134,4 @@ void VPluginSettings::ObjectEvaluationSettings(std::shared_ptr<IObjectEvaluation
 void VPluginSettings::CharacterControls(std::shared_ptr<ICharacterControls>& controls) const
 {
   controls = m_settings.characters;
-}
-
-void VPluginSettings::CalibrationSettings(std::shared_ptr<ICalibrationSettings>& settings) const
-{
-  settings.reset();
 }

@@ -14,6 +14,8 @@ struct HostServices
   std::shared_ptr<TerminalServer2::IServer> server;
   std::shared_ptr<RunaCorePluginInterface::IPluginSettings> settings;
   std::shared_ptr<RunaCorePluginInterface::IDeviceLayoutRegistry> deviceLayouts;
+  std::shared_ptr<RunaCorePluginInterface::ICalibrationProvider> calibration = nullptr;
+  std::shared_ptr<RunaCorePluginInterface::IAccessRights> accessRights = nullptr;
 };
 
 /// The standalone host as the plugin sees it. What it does not have it leaves empty. [host]
@@ -65,7 +67,6 @@ public:
   void ObjectEvaluationSettings(
       std::shared_ptr<RunaCorePluginInterface::IObjectEvaluationSettings>& settings) const override;
   void CharacterControls(std::shared_ptr<ICharacterControls>& controls) const override;
-  void CalibrationSettings(std::shared_ptr<RunaCorePluginInterface::ICalibrationSettings>& settings) const override;
 
 private:
   const std::shared_ptr<RunaCorePluginInterface::IFeatures> m_features;

@@ -68,7 +68,8 @@ public:
   /// The paths of all application entries beneath `path`, in the order of their texts.
   [[nodiscard]] virtual std::vector<EntryPath> ApplicationEntries(EntryPath path) const = 0;
 
-  /// Regular expression (ECMAScript) that a subject's name must match in full.
+  /// Regular expression (ECMAScript) that a subject's name must match in full: that of the setting NameRegex, or the
+  /// store's own.
   [[nodiscard]] virtual std::string NamePattern() const = 0;
 };
 

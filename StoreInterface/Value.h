@@ -70,9 +70,11 @@ struct Option
   friend bool operator==(const Option&, const Option&) = default;
 };
 
-/// Something that can be asked for. Bit 1 (value 2) of the state word is set while it cannot; the text says why.
+/// Something that can be asked for, unless the state word says that it cannot; the text says why.
 struct Action
 {
+  static constexpr std::uint32_t impossible = 2; ///< a bit of the state word
+
   std::uint32_t state = 0;
   std::string text;
 

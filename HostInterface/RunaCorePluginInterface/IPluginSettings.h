@@ -12,7 +12,6 @@ namespace RunaCorePluginInterface
 {
 
 class IObjectEvaluationSettings;
-class ICalibrationSettings;
 
 /// Bits of the feature mask.
 namespace Feature
@@ -50,7 +49,6 @@ public:
   virtual void RigidObjectControls(std::shared_ptr<IRigidObjectControls>& controls) const = 0;
   virtual void ObjectEvaluationSettings(std::shared_ptr<IObjectEvaluationSettings>& settings) const = 0;
   virtual void CharacterControls(std::shared_ptr<ICharacterControls>& controls) const = 0;
-  virtual void CalibrationSettings(std::shared_ptr<ICalibrationSettings>& settings) const = 0;
 };
 
 }

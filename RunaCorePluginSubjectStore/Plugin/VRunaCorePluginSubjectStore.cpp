@@ -2,6 +2,7 @@
 
 #include "HostInterface/NMX/GlobalLog.h"
 #include "HostInterface/NotificationSystem/VAsioPostalServiceStrand.h"
+#include "HostInterface/RunaCorePluginInterface/IAccessRights.h"
 #include "HostInterface/RunaCorePluginInterface/IPluginHost.h"
 #include "HostInterface/RunaCorePluginInterface/IPluginSettings.h"
 #include "HostInterface/TerminalServer2/IServer.h"
@@ -9,6 +10,7 @@
 #include "RunaCorePluginSubjectStore/Catalogue/CharacterFromClustersCatalogue.h"
 #include "RunaCorePluginSubjectStore/Catalogue/ObjectEvaluationCatalogue.h"
 #include "RunaCorePluginSubjectStore/Catalogue/SmartObjectCatalogue.h"
+#include "RunaCorePluginSubjectStore/Catalogue/SubjectCalibrationCatalogue.h"
 #include "RunaCorePluginSubjectStore/SmartObjectServices/DeviceTypes.h"
 
 #include <utility>
@@ -41,22 +43,35 @@ std::shared_ptr<NMX::IStore> Store(const IPluginHost& host)
   return store;
 }
 
-/// Publishes the group of `service` on the host's server, with a strand of its own.
+bool SubjectCalibrationGranted(const IPluginHost& host)
+{
+  std::shared_ptr<IAccessRights> rights;
+  host.AccessRights(rights);
+  return rights && rights->Granted(AccessRight::subjectCalibration);
+}
+
+/// A strand for a group's calls and notifications; null in a host that has nothing to carry them.
+std::shared_ptr<NMX::IPostalService> MakeStrand(const IPluginHost& host)
+{
+  std::shared_ptr<NMX::IAsioPostalService> postal;
+  host.NotificationPostalService(postal);
+  return postal ? NMX::MakeShared<NotificationSystem::VAsioPostalServiceStrand>(std::move(postal)) : nullptr;
+}
+
+/// Publishes the group of `service` on the host's server.
 template <class Interface>
 void Publish(const IPluginHost& host, const TerminalServer2::GroupTable<Interface>& table,
-             const std::shared_ptr<Interface>& service)
+             const std::shared_ptr<Interface>& service, const std::shared_ptr<NMX::IPostalService>& strand)
 {
   std::shared_ptr<TerminalServer2::IServer> server;
   host.Server(server);
-  std::shared_ptr<NMX::IAsioPostalService> postal;
-  host.NotificationPostalService(postal);
-  if (!server || !postal)
+  if (!server || !strand)
   {
     NMX::Log(NMX::systemLog, NMX::ESeverity::Error, "The host has no server for the group %1%.", table.group.name);
     return;
   }
-  const auto strand = NMX::MakeShared<NotificationSystem::VAsioPostalServiceStrand>(std::move(postal));
-  TerminalServer2::RegisterGroup<Interface>(*server, table, service, strand, FeatureMask(host));
+  TerminalServer2::RegisterGroup<Interface>(*server, table, service, strand,
+                                            {FeatureMask(host), SubjectCalibrationGranted(host)});
 }
 
 }
@@ -71,7 +86,7 @@ bool VRunaCorePluginSubjectStore::RegisterServices(IPluginHost& host)
   if ((FeatureMask(host) & Feature::basicObjects) != 0)
   {
     auto service = NMX::MakeShared<BasicObjectServices::VBasicObjectServices>(Store(host));
-    Publish<NMX::IBasicObjectServices>(host, Catalogue::BasicObjectGroup(), service);
+    Publish<NMX::IBasicObjectServices>(host, Catalogue::BasicObjectGroup(), service, MakeStrand(host));
     m_basicObjectServices = std::move(service);
   }
   if ((FeatureMask(host) & Feature::smartObjects) != 0)
@@ -86,7 +101,7 @@ bool VRunaCorePluginSubjectStore::RegisterServices(IPluginHost& host)
     Settings(host)->FileLocations(locations);
     auto service = NMX::MakeShared<SmartObjectServices::VSmartObjectServices>(Store(host), std::move(controls),
                                                                               std::move(locations));
-    Publish<NMX::ISmartObjectServices>(host, Catalogue::SmartObjectGroup(), service);
+    Publish<NMX::ISmartObjectServices>(host, Catalogue::SmartObjectGroup(), service, MakeStrand(host));
     m_smartObjectServices = std::move(service);
   }
   if ((FeatureMask(host) & Feature::objectEvaluation) != 0)
@@ -94,7 +109,7 @@ bool VRunaCorePluginSubjectStore::RegisterServices(IPluginHost& host)
     std::shared_ptr<IObjectEvaluationSettings> evaluation;
     Settings(host)->ObjectEvaluationSettings(evaluation);
     auto service = ObjectEvaluationServices::VObjectEvaluationServices::Make(Store(host), std::move(evaluation));
-    Publish<NMX::IObjectEvaluationServices>(host, Catalogue::ObjectEvaluationGroup(), service);
+    Publish<NMX::IObjectEvaluationServices>(host, Catalogue::ObjectEvaluationGroup(), service, MakeStrand(host));
     m_objectEvaluationServices = std::move(service);
   }
   if ((FeatureMask(host) & (Feature::characters | Feature::markerless)) != 0)
@@ -103,8 +118,29 @@ bool VRunaCorePluginSubjectStore::RegisterServices(IPluginHost& host)
     Settings(host)->CharacterControls(controls);
     auto service = NMX::MakeShared<CharacterFromClustersServices::VCharacterFromClustersServices>(std::move(controls),
                                                                                                   Store(host));
-    Publish<NMX::ICharacterFromClustersServices>(host, Catalogue::CharacterFromClustersGroup(), service);
+    Publish<NMX::ICharacterFromClustersServices>(host, Catalogue::CharacterFromClustersGroup(), service,
+                                                 MakeStrand(host));
     m_characterFromClustersServices = std::move(service);
   }
+  std::shared_ptr<ICalibrationProvider> calibration;
+  host.CalibrationProvider(calibration);
+  if (calibration)
+    RegisterSubjectCalibration(host, *calibration);
   return true;
+}
+
+void VRunaCorePluginSubjectStore::RegisterSubjectCalibration(const IPluginHost& host,
+                                                             const ICalibrationProvider& provider)
+{
+  std::shared_ptr<ISubjectCalibrationController> controller;
+  provider.Controller(controller);
+  std::shared_ptr<ISubjectCreator> creator;
+  provider.SubjectCreator(creator);
+  std::shared_ptr<ICalibrationNotifications> notifications;
+  provider.Notifications(notifications);
+  const auto strand = MakeStrand(host); // before the service, which hears of notifications on it
+  auto service = SubjectCalibrationServices::VSubjectCalibrationServices::Make(
+      Store(host), std::move(controller), std::move(creator), *notifications, strand);
+  Publish<NMX::ISubjectCalibrationServices>(host, Catalogue::SubjectCalibrationGroup(), service, strand);
+  m_subjectCalibrationServices = std::move(service);
 }

@@ -1,10 +1,12 @@
 #pragma once
 
+#include "HostInterface/RunaCorePluginInterface/ICalibrationProvider.h"
 #include "HostInterface/RunaCorePluginInterface/IPlugin.h"
 #include "RunaCorePluginSubjectStore/BasicObjectServices/VBasicObjectServices.h"
 #include "RunaCorePluginSubjectStore/CharacterFromClustersServices/VCharacterFromClustersServices.h"
 #include "RunaCorePluginSubjectStore/ObjectEvaluationServices/VObjectEvaluationServices.h"
 #include "RunaCorePluginSubjectStore/SmartObjectServices/VSmartObjectServices.h"
+#include "RunaCorePluginSubjectStore/SubjectCalibrationServices/VSubjectCalibrationServices.h"
 
 #include <memory>
 
@@ -17,12 +19,17 @@ class VRunaCorePluginSubjectStore final : public RunaCorePluginInterface::IPlugi
 public:
   [[nodiscard]] const char* DisplayName() const override;
 
-  /// Makes and publishes the service groups that the feature mask allows. Always true.
+  /// Makes and publishes the service groups that the feature mask allows, and subject calibration when the host
+  /// provides it. Always true.
   bool RegisterServices(RunaCorePluginInterface::IPluginHost& host) override;
 
 private:
+  void RegisterSubjectCalibration(const RunaCorePluginInterface::IPluginHost& host,
+                                  const RunaCorePluginInterface::ICalibrationProvider& provider);
+
   std::shared_ptr<BasicObjectServices::VBasicObjectServices> m_basicObjectServices;
   std::shared_ptr<ObjectEvaluationServices::VObjectEvaluationServices> m_objectEvaluationServices;
   std::shared_ptr<SmartObjectServices::VSmartObjectServices> m_smartObjectServices;
+  std::shared_ptr<SubjectCalibrationServices::VSubjectCalibrationServices> m_subjectCalibrationServices;
   std::shared_ptr<CharacterFromClustersServices::VCharacterFromClustersServices> m_characterFromClustersServices;
 };

@@ -5,10 +5,11 @@
 namespace TerminalServer2
 {
 
-Level LevelFor(ELevel rule, std::uint32_t featureMask)
+Level LevelFor(ELevel rule, const Grants& grants)
 {
   namespace Feature = RunaCorePluginInterface::Feature;
-  const auto openWith = [featureMask](std::uint32_t feature) -> Level { return (featureMask & feature) != 0 ? 2 : 1; };
+  const auto openWith = [&grants](std::uint32_t feature) -> Level
+  { return (grants.featureMask & feature) != 0 ? 2 : 1; };
   switch (rule)
   {
   case ELevel::Open:
@@ -19,6 +20,8 @@ Level LevelFor(ELevel rule, std::uint32_t featureMask)
     return openWith(Feature::proximityGrouping);
   case ELevel::ObjectEvaluation:
     return openWith(Feature::objectEvaluation);
+  case ELevel::SubjectCalibration:
+    return grants.subjectCalibration ? 2 : 1;
   }
   return 1;
 }

@@ -17,14 +17,22 @@ namespace TerminalServer2
 /// The rule that gives a row its level.
 enum class ELevel
 {
-  Open,            ///< open to everyone
-  AutoAssign,      ///< open when the host has switched on object auto-assign
-  Grouping,        ///< open when the host has switched on proximity grouping
-  ObjectEvaluation ///< open when the host has switched on object evaluation
+  Open,              ///< open to everyone
+  AutoAssign,        ///< open when the host has switched on object auto-assign
+  Grouping,          ///< open when the host has switched on proximity grouping
+  ObjectEvaluation,  ///< open when the host has switched on object evaluation
+  SubjectCalibration ///< open when the host grants it
 };
 
-/// The level that a rule comes to under a feature mask.
-[[nodiscard]] Level LevelFor(ELevel rule, std::uint32_t featureMask);
+/// What decides about levels.
+struct Grants
+{
+  std::uint32_t featureMask = 0;
+  bool subjectCalibration = false;
+};
+
+/// The level that a rule comes to.
+[[nodiscard]] Level LevelFor(ELevel rule, const Grants& grants);
 
 inline constexpr std::size_t maximumArguments = 4;
 
@@ -194,16 +202,16 @@ consteval auto Callback(std::string_view name, std::string_view description, ELe
 /// that one row.
 template <class Interface>
 void RegisterGroup(IServer& server, const GroupTable<Interface>& table, const std::shared_ptr<Interface>& service,
-                   const std::shared_ptr<NMX::IPostalService>& strand, std::uint32_t featureMask)
+                   const std::shared_ptr<NMX::IPostalService>& strand, const Grants& grants)
 {
-  const Level typeLevel = LevelFor(table.typeLevel, featureMask);
+  const Level typeLevel = LevelFor(table.typeLevel, grants);
   (void)server.RegisterType(typeLevel, table.group);
   for (const TypeRecord* type : table.types)
     (void)server.RegisterType(typeLevel, *type);
   for (const auto& row : table.functions)
-    (void)server.RegisterFunction(LevelFor(row.level, featureMask), row.bind(row.text.Record(), service, strand));
+    (void)server.RegisterFunction(LevelFor(row.level, grants), row.bind(row.text.Record(), service, strand));
   for (const auto& row : table.callbacks)
-    (void)server.RegisterCallback(LevelFor(row.level, featureMask), row.bind(row.text.Record(), service, strand));
+    (void)server.RegisterCallback(LevelFor(row.level, grants), row.bind(row.text.Record(), service, strand));
 }
 
 }

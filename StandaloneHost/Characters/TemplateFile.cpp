@@ -2,8 +2,8 @@
 
 #include "StandaloneHost/Files/ElementParts.h"
 #include "StandaloneHost/Files/ElementReader.h"
-#include "StandaloneHost/Files/ValueText.h"
 
+#include <algorithm>
 #include <cstddef>
 #include <utility>
 
@@ -17,28 +17,22 @@ using Files::EPresence;
 namespace
 {
 
-constexpr std::size_t maximumTemplateBytes = std::size_t{1} << 20;
-constexpr Files::ListForm segmentList{"Segment", "segment", 256};
 constexpr Files::ListForm slotList{"Slot", "slot", 256};
 
 class Reader
 {
 public:
-  explicit Reader(const std::filesystem::path& file) : m_xml(file, maximumTemplateBytes) {}
+  explicit Reader(const std::filesystem::path& file) : m_xml(file, Files::maximumTemplateBytes) {}
 
   CharacterTemplate Read();
 
 private:
-  void ReadSegments(const Element& section);
-  std::string ReadParent(const Element& segment) const;
   void ReadSlots(const Element& section);
   void ReadRoles(const Element& section);
-  [[nodiscard]] bool ReadRole(const Element& role);
   void CheckSlots() const;
 
   ElementReader m_xml;
   CharacterTemplate m_content;
-  Files::Once m_segments;
   std::vector<Files::Place> m_slotPlaces;
 };
 
@@ -46,42 +40,13 @@ CharacterTemplate Reader::Read()
 {
   const Element root = Files::EnterFirstVersion(m_xml, "CharacterTemplate");
   Files::ReadSections(m_xml, root,
-                      {{"Segments", EPresence::Required, [this](const Element& section) { ReadSegments(section); }},
+                      {{"Segments", EPresence::Required,
+                        [this](const Element& section) { m_content.segments = Files::ReadSegments(m_xml, section); }},
                        {"Slots", EPresence::Required, [this](const Element& section) { ReadSlots(section); }},
                        {"Roles", EPresence::Optional, [this](const Element& section) { ReadRoles(section); }}});
   m_xml.End();
   CheckSlots();
   return std::move(m_content);
-}
-
-void Reader::ReadSegments(const Element& section)
-{
-  Files::ForEachInList(m_xml, section, segmentList,
-                       [this](const Element& element)
-                       {
-                         element.AllowAttributes({"name", "parent"});
-                         const std::string& name = element.FilledAttribute("name");
-                         std::string parent = ReadParent(element);
-                         m_segments.Check(element.place, "segment " + Files::Quoted(name), name);
-                         m_content.segments.push_back({name, std::move(parent)});
-                         m_xml.LeaveEmpty();
-                       });
-}
-
-/// The segments known so far are those that stand before this one.
-std::string Reader::ReadParent(const Element& segment) const
-{
-  if (m_content.segments.empty())
-  {
-    if (segment.Attribute("parent") != nullptr)
-      Files::Fail(segment.place, "the first segment has a parent, expected none as it is the root");
-    return {};
-  }
-  const std::string& parent = segment.FilledAttribute("parent");
-  if (!m_segments.Seen(parent))
-    Files::Fail(segment.place,
-                "unknown parent " + Files::Quoted(parent) + ", expected the name of a segment that stands before");
-  return parent;
 }
 
 void Reader::ReadSlots(const Element& section)
@@ -102,23 +67,19 @@ void Reader::ReadSlots(const Element& section)
 /// Slots may stand before the segments that they are of.
 void Reader::CheckSlots() const
 {
+  const auto& segments = m_content.segments;
   for (std::size_t index = 0; index < m_slotPlaces.size(); ++index)
-    if (const std::string& segment = m_content.slots[index].segment; !m_segments.Seen(segment))
+    if (const std::string& segment = m_content.slots[index].segment;
+        std::ranges::find(segments, segment, &Files::Segment::name) == segments.end())
       Files::Fail(m_slotPlaces[index],
                   "unknown segment " + Files::Quoted(segment) + ", expected the name of one of the template");
 }
 
 void Reader::ReadRoles(const Element& section)
 {
-  Files::ReadSections(
-      m_xml, section,
-      {{"Solving", EPresence::Optional, [this](const Element& role) { m_content.solving = ReadRole(role); }},
-       {"Retargeting", EPresence::Optional, [this](const Element& role) { m_content.retargeting = ReadRole(role); }}});
-}
-
-bool Reader::ReadRole(const Element& role)
-{
-  return Files::ReadAs<bool>(role.place, Files::Tag(role.name), m_xml.LeaveWithText());
+  Files::ReadSections(m_xml, section,
+                      {Files::TruthValue(m_xml, "Solving", m_content.solving),
+                       Files::TruthValue(m_xml, "Retargeting", m_content.retargeting)});
 }
 
 }

@@ -1,6 +1,7 @@
 #pragma once
 
 #include "StandaloneHost/Files/ConfigurationError.h"
+#include "StandaloneHost/Files/SegmentList.h"
 
 #include <filesystem>
 #include <string>
@@ -8,15 +9,6 @@
 
 namespace Characters
 {
-
-/// A segment of the skeleton that a character is made for.
-struct SegmentTemplate
-{
-  std::string name;
-  std::string parent; ///< one of the segments before it; empty for the root
-
-  friend bool operator==(const SegmentTemplate&, const SegmentTemplate&) = default;
-};
 
 /// A slot that a character starts with, and the segment that the object in it is worn on.
 struct SlotTemplate
@@ -30,8 +22,8 @@ struct SlotTemplate
 /// What a new character starts with.
 struct CharacterTemplate
 {
-  std::vector<SegmentTemplate> segments; ///< 1 to 256, the root first; no two have the same name
-  std::vector<SlotTemplate> slots;       ///< 1 to 256; no two have the same name
+  std::vector<Files::Segment> segments; ///< 1 to 256, the root first; no two have the same name
+  std::vector<SlotTemplate> slots;      ///< 1 to 256; no two have the same name
   bool solving = true;
   bool retargeting = false;
 

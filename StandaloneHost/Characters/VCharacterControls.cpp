@@ -1,52 +1,22 @@
 #include "StandaloneHost/Characters/VCharacterControls.h"
 
-#include "HostInterface/NMX/GlobalLog.h"
 #include "StandaloneHost/Characters/TemplateFile.h"
+#include "StandaloneHost/Files/ReadResult.h"
 #include "StoreInterface/CalibrationState.h"
 #include "StoreInterface/EntryPaths.h"
 
-#include <system_error>
 #include <utility>
 #include <vector>
 
 namespace Characters
 {
 
-using NMX::EResult;
 using NMX::IResult;
 using NMX::TSubjectStoreId;
 namespace Paths = NMX::Paths;
 
 namespace
 {
-
-/// Reads a template: the failures of ICharacterControls, with the reason in the log.
-IResult ReadTemplateFile(const std::filesystem::path& file, CharacterTemplate& content)
-{
-  const auto fail = [](const char* reason, EResult result)
-  {
-    NMX::Log(NMX::subjectStoreLog, NMX::ESeverity::Error, "The character template cannot be used: %1%", reason);
-    return result;
-  };
-  if (file.empty())
-    return EResult::InvalidArgument;
-  std::error_code error;
-  if (std::filesystem::status(file, error).type() == std::filesystem::file_type::not_found)
-    return EResult::FileNotFound;
-  try
-  {
-    content = ReadTemplate(file);
-    return EResult::Ok;
-  }
-  catch (const Files::UnreadableFileError& failure)
-  {
-    return fail(failure.what(), EResult::FileIOFailure);
-  }
-  catch (const Files::ConfigurationError& failure)
-  {
-    return fail(failure.what(), EResult::SerialisationFailure);
-  }
-}
 
 /// The template's slots, numbered from 1.
 std::vector<NMX::Slot> SlotsOf(const CharacterTemplate& content)
@@ -80,7 +50,7 @@ IResult VCharacterControls::CreateFromTemplate(NMX::IEntryEditor& access, const 
   if (const IResult added = access.Add(NMX::ESubjectKind::CharactersFromClusters, name, id); added.Failed())
     return added;
   CharacterTemplate content;
-  if (const IResult read = ReadTemplateFile(file, content); read.Failed())
+  if (const IResult read = Files::TryRead("character template", file, &ReadTemplate, content); read.Failed())
     return read;
   if (const IResult set = access.SetValue(id, Paths::Slots(), SlotsOf(content)); set.Failed())
     return set;

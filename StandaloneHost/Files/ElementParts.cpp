@@ -41,6 +41,12 @@ void ReadSections(ElementReader& xml, const Element& parent, std::initializer_li
       Fail(parent.place, Tag(parent.name) + " lacks an element, expected " + std::string(section.name));
 }
 
+Section TruthValue(ElementReader& xml, std::string_view name, bool& value)
+{
+  return {name, EPresence::Optional, [&xml, &value](const Element& element)
+          { value = ReadAs<bool>(element.place, Tag(element.name), xml.LeaveWithText()); }};
+}
+
 std::vector<NMX::Position> ReadMarkers(ElementReader& xml)
 {
   std::vector<NMX::Position> markers;

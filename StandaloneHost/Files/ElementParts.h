@@ -15,6 +15,9 @@
 namespace Files
 {
 
+/// How large a file may be that describes a single subject.
+inline constexpr std::size_t maximumTemplateBytes = std::size_t{1} << 20;
+
 /// Notices what may stand only once among its siblings. [any]
 class Once
 {
@@ -90,6 +93,9 @@ struct Section
 
 /// Reads the children of `parent`, which is the element that was entered last: these sections, in any order.
 void ReadSections(ElementReader& xml, const Element& parent, std::initializer_list<Section> sections);
+
+/// A section that may be left out, and whose text is a truth value. `value` outlives the section.
+[[nodiscard]] Section TruthValue(ElementReader& xml, std::string_view name, bool& value);
 
 /// The places of the markers that the element that was entered last consists of.
 [[nodiscard]] std::vector<NMX::Position> ReadMarkers(ElementReader& xml);

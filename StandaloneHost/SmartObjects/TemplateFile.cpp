@@ -3,8 +3,6 @@
 #include "StandaloneHost/Files/ElementParts.h"
 #include "StandaloneHost/Files/ElementReader.h"
 
-#include <cstddef>
-
 namespace SmartObjects
 {
 
@@ -15,7 +13,6 @@ using Files::EPresence;
 namespace
 {
 
-constexpr std::size_t maximumTemplateBytes = std::size_t{1} << 20;
 constexpr Files::ListForm clusterList{"SmartCluster", "cluster", 64};
 
 std::vector<ClusterTemplate> ReadClusters(ElementReader& xml, const Element& section)
@@ -38,7 +35,7 @@ std::vector<ClusterTemplate> ReadClusters(ElementReader& xml, const Element& sec
 
 SmartObjectTemplate ReadTemplate(const std::filesystem::path& file)
 {
-  ElementReader xml(file, maximumTemplateBytes);
+  ElementReader xml(file, Files::maximumTemplateBytes);
   const Element root = Files::EnterFirstVersion(xml, "SmartObjectTemplate");
   SmartObjectTemplate content;
   Files::ReadSections(xml, root,

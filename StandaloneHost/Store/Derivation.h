@@ -11,11 +11,11 @@ struct DerivationRules
   bool autoAssign = true; ///< whether characters' empty slots are filled by themselves
 };
 
-/// Brings up to date, before a commit, what subjects have because of other subjects: the warnings of objects, and the
-/// slots of characters with the warnings that follow from them. Costs what the edit touched.
+/// Brings up to date, before a commit, what follows from other things: the warnings of objects, the slots of characters
+/// with the warnings that follow from them, and which actions of the panel are possible. Costs what the edit touched.
 void DeriveDependents(Draft& draft, const DerivationRules& rules);
 
-/// The same for all subjects, whatever the draft has changed.
+/// The same for everything, whatever the draft has changed.
 void DeriveAll(Draft& draft, const DerivationRules& rules);
 
 }

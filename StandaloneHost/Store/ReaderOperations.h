@@ -3,6 +3,7 @@
 #include "StandaloneHost/Store/NameRule.h"
 #include "StandaloneHost/Store/SubjectRecord.h"
 #include "StoreInterface/IStoreReader.h"
+#include "StoreInterface/SettingsPaths.h"
 
 #include <algorithm>
 
@@ -87,7 +88,12 @@ public:
     return NMX::EResult::Ok;
   }
 
-  [[nodiscard]] std::string NamePattern() const override { return std::string(NameRule::pattern); }
+  [[nodiscard]] std::string NamePattern() const override
+  {
+    const NMX::Value* setting = Self().FindApplicationEntry(NMX::PathOf(NMX::ESetting::NameRegex));
+    const auto* pattern = setting != nullptr ? std::get_if<std::string>(setting) : nullptr;
+    return pattern != nullptr && !pattern->empty() ? *pattern : std::string(NameRule::pattern);
+  }
 
 protected:
   [[nodiscard]] const SubjectRecord* Record(Id id) const

@@ -47,7 +47,7 @@ std::vector<NMX::EntryPath> VEntryEditor::ApplicationEntries(NMX::EntryPath path
 
 IResult VEntryEditor::CheckName(std::string_view name, Id owner) const
 {
-  if (!NameRule::Allows(name))
+  if (!NameRule::Allows(name, NamePattern()))
     return EResult::InvalidName;
   const SubjectRecord* holder = m_draft.Find(name);
   return holder == nullptr || holder->id == owner ? EResult::Ok : EResult::AlreadyPresent;

@@ -4,6 +4,7 @@
 #include "StandaloneHost/Store/IArchive.h"
 #include "StandaloneHost/Store/VStoreReader.h"
 
+#include <algorithm>
 #include <utility>
 
 namespace Store
@@ -70,7 +71,9 @@ NMX::Subscription VStore::OnChange(std::string pattern, std::weak_ptr<NMX::IPost
 bool VStore::Empty() const
 {
   const std::shared_lock lock(m_stateMutex);
-  return m_state.SubjectCount() == 0 && m_state.ApplicationEntries().empty();
+  return m_state.SubjectCount() == 0 &&
+         std::all_of(m_state.ApplicationEntries().begin(), m_state.ApplicationEntries().end(),
+                     [](const auto& entry) { return entry.first.Text().starts_with("Application/Settings/"); });
 }
 
 IResult VStore::Commit(ChangeSet&& changes, std::unique_lock<std::mutex> edit)

@@ -36,7 +36,7 @@ public:
   [[nodiscard]] NMX::Subscription OnChange(std::string pattern, std::weak_ptr<NMX::IPostalService> postal,
                                            std::function<void()> handler) override;
 
-  /// True when there is neither a subject nor an application entry.
+  /// True when there is neither a subject nor an application entry that is no setting.
   [[nodiscard]] bool Empty() const;
 
 private:

@@ -4,11 +4,14 @@
 #include "RunaCorePluginSubjectStore/Catalogue/CharacterFromClustersCatalogue.h"
 #include "RunaCorePluginSubjectStore/Catalogue/ObjectEvaluationCatalogue.h"
 #include "RunaCorePluginSubjectStore/Catalogue/SmartObjectCatalogue.h"
+#include "RunaCorePluginSubjectStore/Catalogue/SubjectCalibrationCatalogue.h"
 #include "RunaCorePluginSubjectStore/CharacterFromClustersServices/CharacterWarnings.h"
 #include "RunaCorePluginSubjectStore/CharacterFromClustersServices/VCharacterFromClustersServices.h"
 #include "RunaCorePluginSubjectStore/ObjectEvaluationServices/VObjectEvaluationServices.h"
 #include "RunaCorePluginSubjectStore/SmartObjectServices/SmartObjectWarnings.h"
 #include "RunaCorePluginSubjectStore/SmartObjectServices/VSmartObjectServices.h"
+#include "RunaCorePluginSubjectStore/SubjectCalibrationServices/SubjectCalibrationStates.h"
+#include "RunaCorePluginSubjectStore/SubjectCalibrationServices/VSubjectCalibrationServices.h"
 #include "RunaCorePluginSubjectStore/Subjects/Warnings.h"
 #include "StandaloneHost/Store/VStore.h"
 #include "tests/Support/ManualPostal.h"
@@ -76,7 +79,7 @@ void RegisterBasicObjects(RecordingServer& server, std::uint32_t mask)
 {
   const auto service = NMX::MakeShared<BasicObjectServices::VBasicObjectServices>(NMX::MakeShared<Store::VStore>());
   RegisterGroup<NMX::IBasicObjectServices>(server, Catalogue::BasicObjectGroup(), service,
-                                           std::make_shared<ManualPostal>(), mask);
+                                           std::make_shared<ManualPostal>(), {mask});
 }
 
 void RegisterSmartObjects(RecordingServer& server, std::uint32_t mask)
@@ -84,7 +87,7 @@ void RegisterSmartObjects(RecordingServer& server, std::uint32_t mask)
   const auto service =
       NMX::MakeShared<SmartObjectServices::VSmartObjectServices>(NMX::MakeShared<Store::VStore>(), nullptr, nullptr);
   RegisterGroup<NMX::ISmartObjectServices>(server, Catalogue::SmartObjectGroup(), service,
-                                           std::make_shared<ManualPostal>(), mask);
+                                           std::make_shared<ManualPostal>(), {mask});
 }
 
 void RegisterObjectEvaluation(RecordingServer& server, std::uint32_t mask)
@@ -92,7 +95,7 @@ void RegisterObjectEvaluation(RecordingServer& server, std::uint32_t mask)
   const auto service =
       ObjectEvaluationServices::VObjectEvaluationServices::Make(NMX::MakeShared<Store::VStore>(), nullptr);
   RegisterGroup<NMX::IObjectEvaluationServices>(server, Catalogue::ObjectEvaluationGroup(), service,
-                                                std::make_shared<ManualPostal>(), mask);
+                                                std::make_shared<ManualPostal>(), {mask});
 }
 
 void RegisterCharacters(RecordingServer& server, std::uint32_t mask)
@@ -100,7 +103,15 @@ void RegisterCharacters(RecordingServer& server, std::uint32_t mask)
   const auto service = NMX::MakeShared<CharacterFromClustersServices::VCharacterFromClustersServices>(
       nullptr, NMX::MakeShared<Store::VStore>());
   RegisterGroup<NMX::ICharacterFromClustersServices>(server, Catalogue::CharacterFromClustersGroup(), service,
-                                                     std::make_shared<ManualPostal>(), mask);
+                                                     std::make_shared<ManualPostal>(), {mask});
+}
+
+void RegisterSubjectCalibration(RecordingServer& server, bool granted)
+{
+  const auto service = NMX::MakeShared<SubjectCalibrationServices::VSubjectCalibrationServices>(
+      NMX::MakeShared<Store::VStore>(), nullptr, nullptr);
+  RegisterGroup<NMX::ISubjectCalibrationServices>(server, Catalogue::SubjectCalibrationGroup(), service,
+                                                  std::make_shared<ManualPostal>(), {0, granted});
 }
 
 std::string Name(EArgumentType type, const TypeRecord* enumeration)
@@ -163,7 +174,9 @@ TEST(PublishedApi, GroupsAreRegisteredAsPromisedInTheirOrder)
       {"BasicObjectServices", RegisterBasicObjects},
       {"SmartObjectServices", RegisterSmartObjects},
       {"ObjectEvaluationServices", RegisterObjectEvaluation},
-      {"CharacterFromClustersServices", RegisterCharacters}};
+      {"CharacterFromClustersServices", RegisterCharacters},
+      {"SubjectCalibrationServices",
+       [](RecordingServer& server, std::uint32_t mask) { RegisterSubjectCalibration(server, mask != 0); }}};
   EXPECT_EQ(Promised().at("groups").as_array().size(), groups.size());
   for (const json::value& group : Promised().at("groups").as_array())
   {
@@ -199,7 +212,8 @@ TEST(PublishedApi, EnumerationsAreAsPromisedAndEachWarningHasItsEntry)
       {"BasicObjectServices.EBasicObjectWarning", &NMX::basicObjectWarnings},
       {"SmartObjectServices.ESmartObjectWarning", &NMX::smartObjectWarnings},
       {"CharacterFromClustersServices.ECharacterWarning", &NMX::characterWarnings},
-      {"CharacterFromClustersServices.ECharacterCalibrationState", &NMX::characterCalibrationStates}};
+      {"CharacterFromClustersServices.ECharacterCalibrationState", &NMX::characterCalibrationStates},
+      {"SubjectCalibrationServices.ESubjectCalibrationState", &NMX::subjectCalibrationStates}};
   for (const json::value& promised : Promised().at("enumerations").as_array())
   {
     const std::string name(promised.at("name").as_string());
@@ -212,6 +226,7 @@ TEST(PublishedApi, EnumerationsAreAsPromisedAndEachWarningHasItsEntry)
   EXPECT_EQ(static_cast<unsigned>(NMX::ISmartObjectServices::ESmartObjectWarning::ActiveMarkersOff), 13U);
   EXPECT_EQ(static_cast<unsigned>(Character::ECharacterWarning::InsufficientAutoAssignCandidates), 3U);
   EXPECT_EQ(static_cast<unsigned>(Character::ECharacterCalibrationState::Calibrated), 2U);
+  EXPECT_EQ(static_cast<unsigned>(NMX::ISubjectCalibrationServices::ESubjectCalibrationState::Cancelled), 4U);
 
   // Every subject has an entry for every warning, and a character's slot objects are warned of by one of another name.
   const auto store = NMX::MakeShared<Store::VStore>();
@@ -259,6 +274,18 @@ TEST(PublishedApi, EverythingOfObjectEvaluationHasTheLevelOfItsFeature)
     EXPECT_EQ(server.levels.size(), 11U);
     for (const auto& [name, level] : server.levels)
       EXPECT_EQ(level, mask == 0x200 ? 2U : 1U) << name;
+  }
+}
+
+TEST(PublishedApi, EverythingOfSubjectCalibrationHasTheLevelThatTheHostGrants)
+{
+  for (const bool granted : {true, false})
+  {
+    RecordingServer server;
+    RegisterSubjectCalibration(server, granted);
+    EXPECT_EQ(server.levels.size(), 29U) << "27 functions and callbacks, the group and its enumeration";
+    for (const auto& [name, level] : server.levels)
+      EXPECT_EQ(level, granted ? 2U : 1U) << name;
   }
 }
 

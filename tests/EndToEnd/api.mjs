@@ -49,7 +49,7 @@ export function outputs(record) {
 
 // The failures that a function documents: [name, text]. One code is spelt in two ways.
 export function documentedFailures(record) {
-  return record.results.split('\n').filter(line => line !== '' && !line.startsWith('Ok - '))
+  return record.results.split('\n').filter(line => line !== '' && !/^(Ok|True) - /.test(line))
     .map(line => line.replace(/^Serialization/, 'Serialisation').split(/ - (.*)/, 2));
 }
 
@@ -60,13 +60,14 @@ export function failure(method, name) {
   return { code: codes[name] | 0, message: name, data: { code: codes[name], text } };
 }
 
-export function success(values = {}) {
-  return { code: 0, name: 'Ok', outputs: values };
+// `returned`: what a query answers that answers a truth value.
+export function success(values = {}, returned = undefined) {
+  return { code: 0, name: 'Ok', outputs: values, ...(returned === undefined ? {} : { returned }) };
 }
 
 // Checks a whole answer, its envelope included.
-export function assertSucceeds(answer, values = {}) {
-  assert.deepEqual(answer, { jsonrpc: '2.0', id: answer.id, result: success(values) });
+export function assertSucceeds(answer, values = {}, returned = undefined) {
+  assert.deepEqual(answer, { jsonrpc: '2.0', id: answer.id, result: success(values, returned) });
 }
 
 export function assertFails(answer, method, name) {

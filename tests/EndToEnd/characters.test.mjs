@@ -324,7 +324,8 @@ test('Without auto-assign, slots are filled by hand alone, and nothing is missin
                   { data, options: ['--features', features, '--level', '1'] });
 });
 
-for (const [features, groups] of [['0x4000', [group]], ['0x3', [basic, smart]]])
+const ungated = 'SubjectCalibrationServices'; // is there with any features
+for (const [features, groups] of [['0x4000', [group, ungated]], ['0x3', [basic, smart, ungated]]])
   test(`The groups with --features ${features} are ${groups.join(' and ')}`, () => withStage([], async connection => {
     const { result: description } = await connection.call('rpc.discover');
     const there = groups.includes(group);

@@ -21,6 +21,7 @@ const simpleTypes = {
   'double': ['number'],
   'unsigned 32-bit': ['integer', 0, 2 ** 32 - 1],
   'unsigned 64-bit': ['integer', 0, 2 ** 64],
+  'calibration session id': ['integer', 0, 2 ** 32 - 1],
 };
 
 // Checks what matters of the schema of a published type.
@@ -42,6 +43,13 @@ function assertSchema(schema, type) {
     const [name, minimum, maximum] = simpleTypes[type];
     assert.deepEqual([schema.type, schema.minimum, schema.maximum], [name, minimum, maximum]);
   }
+}
+
+// Checks the described parameters of a published function or callback.
+function assertParams(params, record) {
+  assert.deepEqual(params.map(({ name, description, required }) => ({ name, description, required })),
+                   inputs(record).map(({ name, text }) => ({ name, description: text, required: true })));
+  inputs(record).forEach(({ type }, i) => assertSchema(params[i].schema, type));
 }
 
 // A schema and all that stand within it.
@@ -88,11 +96,13 @@ describe('The description', () => {
       assert.equal(method['x-group'], groupOf(record.name));
       assert.equal(method['x-level'], 2);
 
-      assert.deepEqual(method.params.map(({ name, description, required }) => ({ name, description, required })),
-                       inputs(record).map(({ name, text }) => ({ name, description: text, required: true })));
-      inputs(record).forEach(({ type }, k) => assertSchema(method.params[k].schema, type));
+      assertParams(method.params, record);
 
-      const described = Object.entries(method.result.schema.properties.outputs.properties);
+      const { properties, required } = method.result.schema;
+      const asks = record.results.startsWith('True - ');
+      assert.deepEqual([properties.returned?.type, required.includes('returned')],
+                       [asks ? 'boolean' : undefined, asks]);
+      const described = Object.entries(properties.outputs.properties);
       assert.deepEqual(described.map(([name, schema]) => [name, schema.description]),
                        outputs(record).map(({ name, text }) => [name, text]));
       outputs(record).forEach(({ type }, k) => assertSchema(described[k][1], type));
@@ -103,10 +113,10 @@ describe('The description', () => {
   });
 
   test('has every callback and every type, in their order', () => {
-    const described = document['x-callbacks'].map(({ name, description, params, 'x-level': level }) => (
-      { name, description, params, level }));
-    assert.deepEqual(described,
-                     callbacks.map(({ name, description }) => ({ name, description, params: [], level: 2 })));
+    const described = document['x-callbacks'];
+    assert.deepEqual(described.map(({ name, description, 'x-level': level }) => ({ name, description, level })),
+                     callbacks.map(({ name, description }) => ({ name, description, level: 2 })));
+    callbacks.forEach((record, i) => assertParams(described[i].params, record));
 
     const types = published.groups.flatMap(({ name, description }) => [
       { name, description, values: [] },

@@ -2,7 +2,7 @@
 
 import assert from 'node:assert/strict';
 import { spawn } from 'node:child_process';
-import { existsSync, mkdtempSync, readFileSync, rmSync, writeFileSync } from 'node:fs';
+import { existsSync, mkdtempSync, readFileSync, realpathSync, rmSync, writeFileSync } from 'node:fs';
 import { tmpdir } from 'node:os';
 import { join, resolve } from 'node:path';
 import { setTimeout as sleep } from 'node:timers/promises';
@@ -10,6 +10,12 @@ import { fileURLToPath } from 'node:url';
 
 const binary = resolve(process.env.SUBJECT_STORE_HOST ??
                        fileURLToPath(new URL('../../build/dev/bin/subject-store-host', import.meta.url)));
+
+// The folder with the files that come with the host.
+export function sharedFolder() {
+  return join(realpathSync(binary), '../../share/subject-store');
+}
+
 const slowness = Number(process.env.SUBJECT_STORE_TEST_SLOWNESS ?? 1);
 
 const directories = [];

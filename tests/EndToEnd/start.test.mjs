@@ -37,6 +37,8 @@ const refusedOptions = {
   'a mask with a fraction': [['--features', '1.5'], /features|1\.5/],
   'a mask that is too large': [['--features', '4294967296'], /features|4294967296/],
   'a mask with more after it': [['--features', '1 2'], /features|1 2/],
+  'a time for the T-pose that is no number': [['--t-pose-time', 'long'], /t-pose-time/],
+  'a time for a calibration that is negative': [['--subject-calibration-time', '-1'], /subject-calibration-time/],
   'an unknown level': [['--level', '3'], /level/],
   'a level that is no number': [['--level', 'two'], /level|two/],
   'an unknown log level': [['--log', 'chatty'], /log|chatty/],

@@ -1,6 +1,7 @@
 // A character template: a file either reads as what a template promises, or is refused with its name.
 
 #include "StandaloneHost/Characters/TemplateFile.h"
+#include "tests/Fuzz/SoundSegments.h"
 #include "tests/Fuzz/TemplateTarget.h"
 
 #include <set>
@@ -11,19 +12,12 @@ namespace
 
 bool Sound(const Characters::CharacterTemplate& read)
 {
-  std::set<std::string_view> segments;
-  for (const auto& [name, parent] : read.segments)
-  {
-    if (segments.empty() ? !parent.empty() : !segments.contains(parent))
-      return false;
-    if (name.empty() || !segments.insert(name).second)
-      return false;
-  }
+  const std::set<std::string_view> segments = SoundSegmentNames(read.segments);
   std::set<std::string_view> slots;
   for (const auto& [name, segment] : read.slots)
     if (name.empty() || !segments.contains(segment) || !slots.insert(name).second)
       return false;
-  return !segments.empty() && segments.size() <= 256 && !slots.empty() && slots.size() <= 256;
+  return !segments.empty() && !slots.empty() && slots.size() <= 256;
 }
 
 }

@@ -1,4 +1,5 @@
 #include "StandaloneHost/PluginModule.h"
+#include "StandaloneHost/Calibration/VCalibrationProvider.h"
 #include "StandaloneHost/VPluginHost.h"
 #include "tests/Support/TemporaryFolder.h"
 
@@ -57,7 +58,7 @@ TEST(PluginModule, RegistersTheGroupsThatTheMaskAllowsAndSurvivesItsDestruction)
 {
   const auto postal = NMX::MakeShared<Postal::VAsioPostalService>();
   for (const auto& [mask, count] :
-       {std::pair(0U, 0), std::pair(1U, 20), std::pair(2U, 36), std::pair(0x200U, 11), std::pair(0x203U, 67)})
+       {std::pair(0U, 0), {1U, 20}, {2U, 36}, {0x200U, 11}, {0x203U, 67}, {4U, 20}, {0x4000U, 20}, {0x4004U, 20}})
   {
     auto plugin = LoadPlugin(SUBJECT_STORE_PLUGIN_FILE);
     EXPECT_STREQ(plugin->PluginName(), "");
@@ -72,14 +73,31 @@ TEST(PluginModule, RegistersTheGroupsThatTheMaskAllowsAndSurvivesItsDestruction)
     plugin.reset();
     if (server->kept)
     {
-      std::string_view text = mask < 0x200 ? "[\"Nobody\"]" : "[\"Nobody\", \"Crate\"]";
+      const bool evaluates = (mask & 0x200U) != 0;
+      std::string_view text = evaluates ? "[\"Nobody\", \"Crate\"]" : "[\"Nobody\"]";
       std::promise<NMX::IResult> result;
       server->kept->Invoke(text, [&](const NMX::IServerReply& reply) { result.set_value(reply.Result()); });
       // This host has no object evaluation.
       EXPECT_EQ(result.get_future().get(),
-                NMX::IResult(mask < 0x200 ? NMX::EResult::NotFound : NMX::EResult::NotSupported));
+                NMX::IResult(evaluates ? NMX::EResult::NotSupported : NMX::EResult::NotFound));
     }
   }
+  postal->Stop();
+}
+
+TEST(PluginModule, SubjectCalibrationIsThereWhenTheHostProvidesItWhateverTheMask)
+{
+  const auto postal = NMX::MakeShared<Postal::VAsioPostalService>();
+  const auto store = NMX::MakeShared<Store::VStore>();
+  const auto calibration =
+      std::make_shared<Calibration::VCalibrationProvider>(store, postal, Calibration::CalibrationTimes{});
+  auto plugin = LoadPlugin(SUBJECT_STORE_PLUGIN_FILE);
+  const auto server = std::make_shared<CountingServer>();
+  VPluginHost host({store, postal, server, std::make_shared<VPluginSettings>(0), nullptr, calibration});
+  EXPECT_TRUE(plugin->RegisterServices(host));
+  EXPECT_EQ(server->count, 29);
+  plugin.reset();
+  server->kept.reset();
   postal->Stop();
 }
 

@@ -1,11 +1,10 @@
 #include "StandaloneHost/Characters/VCharacterControls.h"
 
 #include "tests/Support/LogCapture.h"
+#include "tests/Support/ManualAsioPostal.h"
 #include "tests/Support/StoreFixture.h"
 #include "tests/Support/TemporaryFolder.h"
 
-#include <boost/asio/io_context.hpp>
-#include <boost/asio/post.hpp>
 #include <gmock/gmock.h>
 
 #include <fstream>
@@ -19,20 +18,6 @@ namespace Paths = NMX::Paths;
 
 namespace
 {
-
-/// Its tasks and timers run when the test says so.
-struct ManualAsioPostal : NMX::IAsioPostalService
-{
-  void Post(std::function<void()> task) override { boost::asio::post(context, std::move(task)); }
-  boost::asio::io_context& Context() override { return context; }
-  /// Runs the next task; waits for a timer if there is no other.
-  bool RunOne()
-  {
-    context.restart();
-    return context.run_one() != 0;
-  }
-  boost::asio::io_context context;
-};
 
 class CharacterControlsTest : public StoreFixture
 {

@@ -85,8 +85,8 @@ TEST_F(CharacterTemplateFileTest, ReadsTheShippedTemplate)
 {
   const CharacterTemplate biped =
       ReadTemplate(Path(SUBJECT_STORE_SOURCE_DIR) / "StandaloneHost/Characters/Templates/Biped.cct");
-  EXPECT_EQ(biped.segments.front(), (SegmentTemplate{"Pelvis", ""}));
-  EXPECT_THAT(biped.segments, testing::Contains(SegmentTemplate{"RightFoot", "RightShin"}));
+  EXPECT_EQ(biped.segments.front(), (Files::Segment{"Pelvis", ""}));
+  EXPECT_THAT(biped.segments, testing::Contains(Files::Segment{"RightFoot", "RightShin"}));
   EXPECT_EQ(biped.slots.front(), (SlotTemplate{"Pelvis", "Pelvis"}));
   EXPECT_THAT(biped.slots, testing::Each(testing::Truly([](const SlotTemplate& s) { return s.name == s.segment; })));
 }
