@@ -193,15 +193,47 @@ private:
     if (characters.Empty())
       return;
     CurrentIds objects(m_draft, m_draft.Base().AutoAssignable(), IsAutoAssignable);
-    while (!characters.Empty() && !objects.Empty())
+    std::vector<Id> passedOver; // objects that a character could not have
+    while (!characters.Empty() && !(objects.Empty() && passedOver.empty()))
     {
       const Id character = characters.TakeFirst();
+      const Id root = RootOf(character);
       for (const Id slot : SettleSlots(character))
-        if (!objects.Empty())
-          m_draft.MoveUnder(objects.TakeFirst(), character, slot);
+        if (const Id object = TakeOther(root, passedOver, objects); object.Valid())
+          m_draft.MoveUnder(object, character, slot);
       SettleSlots(character);
       m_characters.insert(character);
     }
+  }
+
+  /// What a subject is beneath, at the top.
+  [[nodiscard]] Id RootOf(Id id) const
+  {
+    while (m_draft.Find(id)->Parent().Valid())
+      id = m_draft.Find(id)->Parent();
+    return id;
+  }
+
+  /// The first object that may be assigned, other than `root`: what a character is beneath cannot come beneath it. The
+  /// invalid id when there is none.
+  template <class Objects>
+  static Id TakeOther(Id root, std::vector<Id>& passedOver, Objects& objects)
+  {
+    const auto first = std::find_if(passedOver.begin(), passedOver.end(), [root](Id id) { return id != root; });
+    if (first != passedOver.end())
+    {
+      const Id id = *first;
+      passedOver.erase(first);
+      return id;
+    }
+    while (!objects.Empty())
+    {
+      const Id id = objects.TakeFirst();
+      if (id != root)
+        return id;
+      passedOver.push_back(id);
+    }
+    return {};
   }
 
   void DeriveWarnings(Id id)

@@ -17,7 +17,7 @@ namespace Store
 ///   in no slot.
 /// - With `autoAssign`, the empty slots of enabled characters are filled by auto-assignable objects: characters in the
 ///   order in which they were added, their slots in order, by the objects in the order in which they were added. What
-///   is in a slot stays there.
+///   is in a slot stays there. A character is not given an object that it is beneath.
 /// - An object in a slot, with auto-assign enabled, has the slot's name as its auto-assigned name; others have none.
 /// - The warnings of characters follow: of empty slots and of warnings on the objects in them, of a missing
 ///   calibration, and with `autoAssign` of a missing reference cluster and missing objects.

@@ -197,6 +197,23 @@ TEST_F(CharacterSlotsTest, WhatChangesInTheSameEditIsAssignedAsTheEditLeavesIt)
   EXPECT_EQ(PlaceOf(manual), nowhere);
 }
 
+TEST_F(CharacterSlotsTest, ACharacterIsNotGivenWhatItIsBeneath)
+{
+  const Id cart = AddObject("Cart", false);
+  const Id chair = AddObject("Chair", false);
+  const Id ada = AddCharacter("Ada", 2);
+  Set(chair, Paths::ParentSubjectId(), cart);
+  Set(ada, Paths::ParentSubjectId(), chair);
+  Set(cart, Paths::AutoAssignEnabled(), true);
+  EXPECT_EQ(PlaceOf(cart), nowhere);
+  const Id hat = AddObject("Hat", true);
+  EXPECT_EQ(PlaceOf(hat), (Place{ada, Id(1), "Slot 1"})) << "others are assigned past it";
+  EXPECT_EQ(PlaceOf(cart), nowhere);
+  const Id ben = AddCharacter("Ben", 1);
+  EXPECT_EQ(PlaceOf(cart), (Place{ben, Id(1), "Slot 1"}));
+  Set(ada, Paths::Enabled(), false); // the store goes on
+}
+
 TEST_F(CharacterSlotsTest, NothingIsAssignedInAHostWithoutAutoAssignment)
 {
   store = NMX::MakeShared<Store::VStore>(Store::DerivationRules{false});
