@@ -18,6 +18,8 @@ const std::map<std::string, std::set<std::string>> allowed{
     {"HostInterface", {}},
     {"StoreInterface", {"HostInterface"}},
 
+    {"SubjectStoreUI", {"HostInterface", "StoreInterface"}},
+
     {"RunaCorePluginSubjectStore/Subjects", {"HostInterface", "StoreInterface"}},
     {"RunaCorePluginSubjectStore/BasicObjectServices",
      {"RunaCorePluginSubjectStore/Subjects", "HostInterface", "StoreInterface"}},
@@ -76,7 +78,7 @@ TEST(Architecture, FoldersIncludeOnlyDownwards)
   const std::regex include("^\\s*#\\s*include\\s+\"([^\"]+)\"");
   std::vector<std::string> wrong;
   int files = 0;
-  for (const char* top : {"HostInterface", "StoreInterface", "RunaCorePluginSubjectStore", "StandaloneHost"})
+  for (const char* top : {"HostInterface", "StoreInterface", "SubjectStoreUI", "RunaCorePluginSubjectStore", "StandaloneHost"})
     for (const auto& entry : fs::recursive_directory_iterator(root / top))
     {
       if (entry.path().extension() != ".h" && entry.path().extension() != ".cpp")

@@ -1,0 +1,79 @@
+#pragma once
+
+#include "HostInterface/NMX/ITypedId.h"
+
+#include <QMetaType>
+#include <QObject>
+#include <QString>
+
+namespace SubjectStoreUI
+{
+
+/// The id of a subject, or of something else in the store, as QML sees it: something to compare and to hand back. A
+/// JavaScript number could not hold it.
+class VStoreIdGadget
+{
+  Q_GADGET
+  Q_PROPERTY(bool valid READ Valid CONSTANT)
+
+public:
+  VStoreIdGadget() = default;
+  explicit VStoreIdGadget(NMX::TSubjectStoreId id) : m_id(id) {}
+
+  [[nodiscard]] NMX::TSubjectStoreId Id() const { return m_id; }
+  [[nodiscard]] bool Valid() const { return m_id.Valid(); }
+  Q_INVOKABLE [[nodiscard]] QString toString() const { return QString::number(m_id.Value()); }
+  Q_INVOKABLE [[nodiscard]] bool equals(const SubjectStoreUI::VStoreIdGadget& other) const
+  {
+    return m_id == other.m_id;
+  }
+
+  friend bool operator==(const VStoreIdGadget&, const VStoreIdGadget&) = default;
+
+private:
+  NMX::TSubjectStoreId m_id;
+};
+
+/// What a row stands for in a selection: a subject, or a slot of a character.
+class VSelectionItemGadget
+{
+  Q_GADGET
+  Q_PROPERTY(SubjectStoreUI::VStoreIdGadget subject READ Subject CONSTANT)
+  Q_PROPERTY(int slot READ Slot CONSTANT)
+
+public:
+  VSelectionItemGadget() = default;
+  /// `slot` is the slot's position; -1 for the subject itself.
+  explicit VSelectionItemGadget(NMX::TSubjectStoreId subject, int slot = -1) : m_subject(subject), m_slot(slot) {}
+
+  [[nodiscard]] VStoreIdGadget Subject() const { return VStoreIdGadget(m_subject); }
+  [[nodiscard]] int Slot() const { return m_slot; }
+
+  friend bool operator==(const VSelectionItemGadget&, const VSelectionItemGadget&) = default;
+
+private:
+  NMX::TSubjectStoreId m_subject;
+  int m_slot = -1;
+};
+
+/// A place in mm.
+class VPositionGadget
+{
+  Q_GADGET
+  Q_PROPERTY(double x MEMBER x CONSTANT)
+  Q_PROPERTY(double y MEMBER y CONSTANT)
+  Q_PROPERTY(double z MEMBER z CONSTANT)
+
+public:
+  double x = 0;
+  double y = 0;
+  double z = 0;
+
+  friend bool operator==(const VPositionGadget&, const VPositionGadget&) = default;
+};
+
+}
+
+Q_DECLARE_METATYPE(SubjectStoreUI::VStoreIdGadget)
+Q_DECLARE_METATYPE(SubjectStoreUI::VSelectionItemGadget)
+Q_DECLARE_METATYPE(SubjectStoreUI::VPositionGadget)
