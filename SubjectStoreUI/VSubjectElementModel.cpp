@@ -171,9 +171,9 @@ void VSubjectElementModel::refresh()
     for (const auto& [subject, elements] : m_elements->known)
     {
       NMX::ChangeStamps stamps{};
-      if (access->Stamps(subject, stamps).Failed() || !m_subjects || !m_subjects->indexForSubject(subject).isValid())
+      if (!m_subjects || !m_subjects->indexForSubject(subject).isValid())
         gone.push_back(subject); // its row has gone with all that was beneath
-      else if (stamps != elements.stamps)
+      else if (access->Stamps(subject, stamps).Succeeded() && stamps != elements.stamps) // else its row goes soon
         changed.emplace(subject, Elements::OfSubject{ReadElements(*access, subject), stamps});
     }
   }
