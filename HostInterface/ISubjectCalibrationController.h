@@ -26,7 +26,7 @@ public:
   ISubjectCalibrationController& operator=(const ISubjectCalibrationController&) = delete;
   virtual ~ISubjectCalibrationController() = default;
 
-  /// The subject that the next calibration works on.
+  /// The subject that the next calibration works on. `InvalidId` when there is no such subject.
   virtual NMX::IResult SetTargetSubject(NMX::TSubjectStoreId subject) = 0;
 
   /// That subject and everything beneath it.
@@ -35,7 +35,8 @@ public:
   /// Whether the action is possible now; if it is not, `reason` is a sentence for people.
   virtual bool CanPerform(ECalibrationAction action, std::string& reason) const = 0;
 
-  /// Performs the action. To start is to be given a session id; the other actions need that of the run.
+  /// Performs the action. To start is to be given a session id; the other actions need that of the run, and are
+  /// `InvalidSession` with another. `NotAvailable` when CanPerform would say no. What fails has not happened.
   virtual NMX::IResult Perform(ECalibrationAction action, NMX::TCalibrationSessionId& session) = 0;
 
   /// 1 while it looks for the T-pose, 2 and 3 while it calibrates; anything else: nothing runs.

@@ -39,13 +39,7 @@ const QList<int>& SubjectsModelRole::All()
 
 const QHash<int, QByteArray>& SubjectsModelRole::Names()
 {
-  static const QHash<int, QByteArray> names = []
-  {
-    QHash<int, QByteArray> made;
-    for (const Key& key : keys)
-      made.insert(key.role, RoleName(key.text));
-    return made;
-  }();
+  static const QHash<int, QByteArray> names = RoleNames(keys);
   return names;
 }
 

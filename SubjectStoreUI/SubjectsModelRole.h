@@ -10,6 +10,20 @@
 namespace SubjectStoreUI
 {
 
+/// The name of a role with that key: without a trailing "Role" and an "E" before a capital, and with a small first
+/// letter.
+[[nodiscard]] QByteArray RoleName(std::string_view key);
+
+/// The names of roles by their numbers, from a table of keys.
+template <class Keys>
+[[nodiscard]] QHash<int, QByteArray> RoleNames(const Keys& keys)
+{
+  QHash<int, QByteArray> names;
+  for (const auto& key : keys)
+    names.insert(key.role, RoleName(key.text));
+  return names;
+}
+
 /// What the models of subjects tell of a row.
 namespace SubjectsModelRole
 {
@@ -79,9 +93,5 @@ static_assert(keys.front().role == 257 && keys.back().role == 278);
 [[nodiscard]] const QHash<int, QByteArray>& Names();
 
 }
-
-/// The name of a role with that key: without a trailing "Role" and an "E" before a capital, and with a small first
-/// letter.
-[[nodiscard]] QByteArray RoleName(std::string_view key);
 
 }

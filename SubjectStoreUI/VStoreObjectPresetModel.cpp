@@ -108,13 +108,7 @@ std::vector<std::pair<EntryPath, NMX::Value>> Parameters(const NMX::IStoreReader
 
 const QHash<int, QByteArray>& ObjectPresetRole::Names()
 {
-  static const QHash<int, QByteArray> names = []
-  {
-    QHash<int, QByteArray> made;
-    for (const Key& key : keys)
-      made.insert(key.role, RoleName(key.text));
-    return made;
-  }();
+  static const QHash<int, QByteArray> names = RoleNames(keys);
   return names;
 }
 

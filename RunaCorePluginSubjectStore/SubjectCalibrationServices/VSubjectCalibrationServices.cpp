@@ -1,11 +1,9 @@
 #include "RunaCorePluginSubjectStore/SubjectCalibrationServices/VSubjectCalibrationServices.h"
 
+#include "RunaCorePluginSubjectStore/SubjectCalibrationServices/Settings.h"
+#include "RunaCorePluginSubjectStore/Subjects/NameCheck.h"
 #include "RunaCorePluginSubjectStore/Subjects/SubjectAccess.h"
-#include "StoreInterface/WideText.h"
 
-#include <boost/regex.hpp>
-
-#include <algorithm>
 #include <set>
 #include <utility>
 
@@ -28,39 +26,10 @@ auto MakeCallback()
   return NMX::MakeShared<NotificationSystem::VMultiCallbackPostal<Signature>>();
 }
 
-/// A setting that has a value of type `T`; null otherwise. Valid as long as the access is.
-template <class T>
-const T* FindSetting(const NMX::IStoreReader& access, ESetting setting)
-{
-  const NMX::Value* value = access.FindApplicationEntry(NMX::PathOf(setting));
-  return value != nullptr ? std::get_if<T>(value) : nullptr;
-}
-
-std::wstring ChosenPath(const NMX::IStoreReader& access, ESetting setting)
-{
-  const auto* option = FindSetting<NMX::Option>(access, setting);
-  return option != nullptr ? option->chosen : std::wstring{};
-}
-
 /// Files are named after captures.
 bool IsCaptureName(const std::string& name)
 {
   return name.find_first_of(R"(/:*?"<>|.,;\)") == std::string::npos;
-}
-
-/// A pattern that is none matches nothing.
-bool Matches(const std::string& name, const std::string& pattern)
-{
-  try
-  {
-    return boost::regex_match(name, boost::regex(pattern, boost::regex::perl));
-  }
-  catch (const std::exception& failure)
-  {
-    NMX::Log(NMX::subjectStoreLog, NMX::ESeverity::Error, "The name pattern \"%1%\" cannot be applied: %2%", pattern,
-             failure.what());
-    return false;
-  }
 }
 
 /// Runs a query; an exception that escapes it is logged, and the answer is no.
@@ -350,7 +319,7 @@ IResult VSubjectCalibrationServices::SetNewSubjectName(const std::string& subjec
         TSubjectStoreId named;
         {
           const auto reader = m_store->Reader();
-          if (!Matches(subjectName, reader->NamePattern()))
+          if (!Subjects::MatchesPattern(subjectName, reader->NamePattern()))
             return EResult::InvalidArgument;
           (void)reader->FindByName(subjectName, named);
         }
@@ -379,92 +348,35 @@ IResult VSubjectCalibrationServices::NewSubjectName(std::string& subjectName) co
       });
 }
 
-/// The names of a setting's options; none when it has no value.
-IResult VSubjectCalibrationServices::OptionNames(ESetting setting, std::vector<std::string>& names) const
-{
-  return Guarded(
-      [&]() -> IResult
-      {
-        const auto reader = m_store->Reader();
-        std::vector<std::string> found;
-        if (const auto* option = FindSetting<NMX::Option>(*reader, setting))
-          for (const NMX::Choice& choice : option->choices)
-            found.push_back(choice.name);
-        names = std::move(found);
-        return EResult::Ok;
-      });
-}
-
-IResult VSubjectCalibrationServices::Choose(ESetting setting, const std::string& name)
-{
-  return Guarded(
-      [&]() -> IResult
-      {
-        const auto editor = m_store->Editor();
-        const auto* option = FindSetting<NMX::Option>(*editor, setting);
-        if (option == nullptr)
-          return EResult::Failed;
-        NMX::Option chosen = *option;
-        const auto choice = std::find_if(chosen.choices.begin(), chosen.choices.end(),
-                                         [&](const NMX::Choice& each) { return each.name == name; });
-        if (choice == chosen.choices.end())
-          return EResult::Failed;
-        chosen.chosen = choice->path;
-        if (const IResult set = editor->SetApplicationEntry(NMX::PathOf(setting), std::move(chosen)); set.Failed())
-          return set;
-        return editor->Commit();
-      });
-}
-
-IResult VSubjectCalibrationServices::Chosen(ESetting setting, std::string& name, std::string& path) const
-{
-  return Guarded(
-      [&]() -> IResult
-      {
-        const auto reader = m_store->Reader();
-        const auto* option = FindSetting<NMX::Option>(*reader, setting);
-        if (option == nullptr)
-          return EResult::Failed;
-        const auto choice = std::find_if(option->choices.begin(), option->choices.end(),
-                                         [&](const NMX::Choice& each) { return each.path == option->chosen; });
-        const auto text = choice != option->choices.end() ? NMX::ToUtf8(choice->path) : std::nullopt;
-        if (!text)
-          return EResult::Failed;
-        name = choice->name;
-        path = *text;
-        return EResult::Ok;
-      });
-}
-
 IResult VSubjectCalibrationServices::SubjectLabellingTemplates(std::vector<std::string>& labellingTemplates) const
 {
-  return OptionNames(ESetting::CreateSubjectTemplate, labellingTemplates);
+  return OptionNames(*m_store, ESetting::CreateSubjectTemplate, labellingTemplates);
 }
 
 IResult VSubjectCalibrationServices::SetSubjectLabellingTemplate(const std::string& labellingTemplate)
 {
-  return Choose(ESetting::CreateSubjectTemplate, labellingTemplate);
+  return Choose(*m_store, ESetting::CreateSubjectTemplate, labellingTemplate);
 }
 
 IResult VSubjectCalibrationServices::SubjectLabellingTemplate(std::string& labellingTemplate,
                                                               std::string& labellingTemplatePath) const
 {
-  return Chosen(ESetting::CreateSubjectTemplate, labellingTemplate, labellingTemplatePath);
+  return Chosen(*m_store, ESetting::CreateSubjectTemplate, labellingTemplate, labellingTemplatePath);
 }
 
 IResult VSubjectCalibrationServices::SubjectSkins(std::vector<std::string>& skins) const
 {
-  return OptionNames(ESetting::CreateSubjectSkin, skins);
+  return OptionNames(*m_store, ESetting::CreateSubjectSkin, skins);
 }
 
 IResult VSubjectCalibrationServices::SetSubjectSkin(const std::string& skin)
 {
-  return Choose(ESetting::CreateSubjectSkin, skin);
+  return Choose(*m_store, ESetting::CreateSubjectSkin, skin);
 }
 
 IResult VSubjectCalibrationServices::SubjectSkin(std::string& skin, std::string& skinPath) const
 {
-  return Chosen(ESetting::CreateSubjectSkin, skin, skinPath);
+  return Chosen(*m_store, ESetting::CreateSubjectSkin, skin, skinPath);
 }
 
 std::shared_ptr<NMX::ISubjectCalibrationServices::SettingsChangedCallback>

@@ -8,7 +8,6 @@
 #include "HostInterface/NotificationSystem/VMultiCallbackPostal.h"
 #include "RunaCorePluginSubjectStore/SubjectCalibrationServices/ISubjectCalibrationServices.h"
 #include "StoreInterface/IStore.h"
-#include "StoreInterface/SettingsPaths.h"
 
 #include <array>
 #include <cstddef>
@@ -87,9 +86,6 @@ private:
   NMX::IResult SetTarget(NMX::TSubjectStoreId subject);
   NMX::IResult PerformIfPossible(ECalibrationAction action, NMX::TCalibrationSessionId session);
   NMX::IResult Start(ECalibrationAction action, NMX::TCalibrationSessionId& session);
-  NMX::IResult OptionNames(NMX::ESetting setting, std::vector<std::string>& names) const;
-  NMX::IResult Choose(NMX::ESetting setting, const std::string& name);
-  NMX::IResult Chosen(NMX::ESetting setting, std::string& name, std::string& path) const;
 
   const std::shared_ptr<NMX::IStore> m_store;
   const std::shared_ptr<ISubjectCalibrationController> m_controller;

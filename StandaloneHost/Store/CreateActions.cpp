@@ -62,6 +62,8 @@ std::string Obstacle(const Draft& draft, const Creation& creation)
   const auto& name = Setting<std::string>(draft, creation.name);
   if (name.empty())
     return "No name is given.";
+  if (name.size() > NameRule::maximumBytes)
+    return "The name is too long.";
   if (!NameRule::Allows(name, Setting<std::string>(draft, ESetting::NameRegex)))
     return "The name \"" + name + "\" is not allowed.";
   if (draft.Find(name) != nullptr)

@@ -35,6 +35,7 @@ const std::optional<boost::regex>& Compiled(const std::string& text)
 bool Allows(std::string_view name)
 {
   static const boost::regex expression(pattern.begin(), pattern.end(), boost::regex::perl);
+  // The length is asked first: what is far too long is not looked at.
   return name.size() <= maximumBytes && boost::regex_match(name.begin(), name.end(), expression);
 }
 

@@ -11,12 +11,12 @@ namespace Store
 namespace NameRule
 {
 
-/// At least one character, no control character, none of / \ : * ? " < > |, no space at either end.
-inline constexpr std::string_view pattern = R"(^(?! )[^\x00-\x1F\x7F/\\:*?"<>|]+(?<! )$)";
+/// 1 to 255 bytes, no control character, none of / \ : * ? " < > |, no space at either end.
+inline constexpr std::string_view pattern = R"(^(?! )[^\x00-\x1F\x7F/\\:*?"<>|]{1,255}(?<! )$)";
 
 inline constexpr std::size_t maximumBytes = 255;
 
-/// True when the name matches the pattern in full and is not longer than the maximum. [any]
+/// True when the name matches the pattern in full. [any]
 [[nodiscard]] bool Allows(std::string_view name);
 
 /// The same, and the name must match a second pattern in full as well, unless that is empty. Nothing matches a pattern

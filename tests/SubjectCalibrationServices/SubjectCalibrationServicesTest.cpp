@@ -352,8 +352,11 @@ TEST_F(SubjectCalibrationServicesTest, ANameOfASubjectMakesItTheTarget)
   EXPECT_EQ(service->SetNewSubjectName("Nobody yet"), IResult(EResult::Ok));
   EXPECT_EQ(NewName(), "Nobody yet");
 
-  for (const char* name : {"", " x", "a/b", "x\n"})
-    EXPECT_EQ(service->SetNewSubjectName(name), IResult(EResult::InvalidArgument)) << name;
+  for (const std::string& name : {std::string(), std::string(" x"), std::string("a/b"), std::string("x\n"),
+                                  std::string(256, 'x'), std::string(1 << 20, 'x')})
+    EXPECT_EQ(service->SetNewSubjectName(name), IResult(EResult::InvalidArgument)) << name.substr(0, 9);
+  EXPECT_EQ(service->SetNewSubjectName(std::string(255, 'x')), IResult(EResult::Ok));
+  EXPECT_EQ(service->SetNewSubjectName("Nobody yet"), IResult(EResult::Ok));
   const LogCapture log;
   for (const char* pattern : {"[", "(a+)+$", "Z.."})
   {

@@ -1,17 +1,11 @@
 #include "SubjectStoreUI/NaturalOrder.h"
-#include "SubjectStoreUI/SubjectGadgets.h"
 #include "SubjectStoreUI/VSortSubjectsProxyModel.h"
 #include "SubjectStoreUI/VSubjectElementModel.h"
-#include "SubjectStoreUI/VSubjectListModelStore.h"
-#include "SubjectStoreUI/VSubjectModelInternalData.h"
 #include "SubjectStoreUI/VSubjectStoreProxyModel.h"
-#include "SubjectStoreUI/VSubjectTreeModelStore.h"
-#include "SubjectStoreUI/VSubjectWithSlotsTreeModelStore.h"
-#include "tests/Support/ManualPostal.h"
+#include "tests/Support/ModelFixture.h"
 #include "tests/Support/ModelShadow.h"
-#include "tests/Support/StoreFixture.h"
+#include "tests/Support/RandomStoreEdits.h"
 
-#include <QCoreApplication>
 #include <QItemSelectionModel>
 #include <QMetaProperty>
 
@@ -19,7 +13,7 @@
 
 #include <algorithm>
 #include <map>
-#include <random>
+#include <utility>
 
 using namespace SubjectStoreUI;
 using NMX::ESubjectKind;
@@ -30,26 +24,6 @@ namespace Role = SubjectsModelRole;
 
 namespace
 {
-
-using Names = std::vector<std::string>;
-
-std::string NameOf(const QModelIndex& index)
-{
-  return index.data(Role::SubjectName).toString().toStdString();
-}
-
-Names NamesBeneath(const QAbstractItemModel& model, const QModelIndex& parent = {})
-{
-  Names names;
-  for (int row = 0; row < model.rowCount(parent); ++row)
-    names.push_back(NameOf(model.index(row, 0, parent)));
-  return names;
-}
-
-NMX::TSubjectStoreId IdAt(const QModelIndex& index)
-{
-  return index.data(Role::SubjectStoreId).value<VStoreIdGadget>().Id();
-}
 
 /// Its element models come and go without a reset.
 template <class Base>
@@ -116,7 +90,7 @@ private:
   Names told;
 };
 
-class ProxyModelsTest : public StoreFixture
+class ProxyModelsTest : public ModelFixture
 {
 protected:
   std::shared_ptr<VSubjectElementModel> Attach(VSubjectModelStoreBase& base)
@@ -136,12 +110,6 @@ protected:
     return std::make_unique<VSortSubjectsProxyModel>(std::move(source), VSubjectTypeGadget(ESubjectKind::Props),
                                                      "Props", &summary);
   }
-
-  int argumentCount = 0;
-  QCoreApplication application{argumentCount, nullptr};
-  std::shared_ptr<VSubjectModelInternalData> data =
-      std::make_shared<VSubjectModelInternalData>(store, std::make_shared<ManualPostal>());
-  VSubjectWarningSummary summary;
 };
 
 }
@@ -160,7 +128,7 @@ TEST_F(ProxyModelsTest, ASectionIsSortedAsPeopleSortNames)
     std::vector<Id> ids;
     for (const std::string& name : added)
       ids.push_back(Add(ESubjectKind::Props, name));
-    EXPECT_EQ(NamesBeneath(*Sorted(NMX::MakeShared<VSubjectListModelStore>(data))), expected);
+    EXPECT_EQ(NamesBeneath(*Sorted(MakeList())), expected);
     for (const Id id : ids)
       Remove(id);
   }
@@ -170,7 +138,7 @@ TEST_F(ProxyModelsTest, ASectionIsSortedAsPeopleSortNames)
   for (std::uint64_t slot = 1; slot <= 12; ++slot)
     slots.push_back({Id(slot), "Slot" + std::to_string(100 - slot)});
   Set(ada, Paths::Slots(), slots);
-  const auto tree = NMX::MakeShared<VSubjectWithSlotsTreeModelStore>(data, ESubjectKind::CharactersFromClusters);
+  const auto tree = MakeSlotTree();
   const auto sorted = Sorted(tree);
   for (int row = 0; row < 12; ++row)
     EXPECT_EQ(sorted->mapToSource(sorted->index(row, 0, sorted->index(0, 0))).row(), row);
@@ -178,7 +146,7 @@ TEST_F(ProxyModelsTest, ASectionIsSortedAsPeopleSortNames)
 
 TEST_F(ProxyModelsTest, ASectionSaysWhatItIsOfAndKeepsItsModel)
 {
-  auto list = NMX::MakeShared<VSubjectListModelStore>(data);
+  auto list = MakeList();
   const std::weak_ptr<VSubjectListModelStore> watch = list;
   auto shown = std::make_unique<VSubjectWarningSummary>();
   auto sorted = std::make_unique<VSortSubjectsProxyModel>(std::move(list), VSubjectTypeGadget(ESubjectKind::Markerless),
@@ -205,7 +173,7 @@ TEST_F(ProxyModelsTest, ASectionIsSortedOnceAfterTextsCameOrChanged)
 {
   const Id b = Add(ESubjectKind::Props, "B");
   Add(ESubjectKind::Props, "C");
-  const auto list = NMX::MakeShared<VSubjectListModelStore>(data);
+  const auto list = MakeList();
   const auto sorted = Sorted(list);
   const ModelShadow shadow(*sorted);
   Recorder recorder(*sorted);
@@ -305,7 +273,7 @@ TEST_F(ProxyModelsTest, ElementsLieBeneathTheirSubjectAfterItsChildren)
   Set(arm, Paths::ParentSubjectId(), body);
   Set(hand, Paths::ParentSubjectId(), body);
   SetMarkers(body, 2);
-  const auto tree = NMX::MakeShared<VSubjectTreeModelStore>(data, ESubjectKind::BasicObjects);
+  const auto tree = MakeTree(ESubjectKind::BasicObjects);
   const auto joined = NMX::MakeShared<VSubjectStoreProxyModel>(tree);
   ModelShadow shadow(*joined);
   Attach(*tree);
@@ -430,7 +398,7 @@ TEST_F(ProxyModelsTest, WhatHasNoModelIsLoggedAndEmpty)
   NMX::GlobalLog::SetSink(nullptr);
 
   // The base model goes with the proxy that is the last to hold it, and its element models with it.
-  auto last = NMX::MakeShared<VSubjectListModelStore>(data);
+  auto last = MakeList();
   Attach(*last);
   auto holder = NMX::MakeShared<VSubjectStoreProxyModel>(std::move(last));
   Recorder recorder(*holder);
@@ -441,91 +409,21 @@ TEST_F(ProxyModelsTest, WhatHasNoModelIsLoggedAndEmpty)
 namespace
 {
 
-/// Edits of what the proxies show. Subjects come and go, and now and then all go.
-class ProxyEdits
-{
-public:
-  explicit ProxyEdits(unsigned seed) : m_random(seed) {}
-
-  void Transaction(NMX::IStore& store)
-  {
-    const auto editor = store.Editor();
-    const int count = ++m_transactions % 800 < 25 ? 4 : 1 + Below(3);
-    for (int edit = 0; edit < count; ++edit)
-      Edit(*editor);
-    EXPECT_TRUE(editor->Commit().Succeeded());
-  }
-
-  int Below(int limit) { return static_cast<int>(m_random() % static_cast<unsigned>(limit)); }
-
-private:
-  using Id = NMX::TSubjectStoreId;
-
-  void Edit(NMX::IEntryEditor& editor)
-  {
-    constexpr ESubjectKind kinds[] = {ESubjectKind::BasicObjects, ESubjectKind::CharactersFromClusters,
-                                      ESubjectKind::GeneralSubjects};
-    const std::string name = std::string(1, "abAB"[Below(4)]) + std::to_string(Below(1000));
-    std::vector<Id> all;
-    for (const ESubjectKind kind : kinds)
-    {
-      std::vector<Id> ids;
-      (void)editor.Subjects(kind, ids);
-      all.insert(all.end(), ids.begin(), ids.end());
-    }
-    const auto any = [&] { return all[static_cast<std::size_t>(Below(static_cast<int>(all.size())))]; };
-    const bool emptying = m_transactions % 800 < 25;
-    Id added;
-    if (all.empty() && emptying)
-      return;
-    if (all.empty() || (!emptying && all.size() < 18 && Below(4) == 0))
-      (void)editor.Add(kinds[Below(3)], name, added);
-    else if (emptying || (all.size() > 12 && Below(4) == 0))
-      (void)editor.Remove(any());
-    else if (const Id id = any(); Below(4) == 0)
-      (void)editor.Rename(id, name, NMX::ENotify::Yes);
-    else if (Below(3) == 0)
-      (void)editor.SetValue(id, Paths::ParentSubjectId(), Below(3) == 0 ? Id{} : any());
-    else if (Below(3) == 0)
-      (void)editor.SetValue(id, Paths::ParentSubjectSlotId(), Id(Below(5)));
-    else if (Below(2) == 0)
-    {
-      std::vector<NMX::Slot> slots;
-      for (int slot = 1; slot <= 4; ++slot)
-        if (Below(3) != 0)
-          slots.push_back({Id(slot), name});
-      std::shuffle(slots.begin(), slots.end(), m_random);
-      (void)editor.SetValue(id, Paths::Slots(), slots);
-    }
-    else
-      (void)editor.SetValue(id, Paths::Markers(),
-                            std::vector<NMX::Position>(static_cast<std::size_t>(Below(4)), {1.0 * Below(9), 2, 3}));
-  }
-
-  std::mt19937 m_random;
-  int m_transactions = 0;
-};
-
 /// The joining model shows what its sources do, asked one by one.
 void ExpectJoined(const VSubjectStoreProxyModel& joined, const VSubjectModelStoreBase& base)
 {
-  const auto same = [&](const QModelIndex& shown, const QAbstractItemModel& source, const QModelIndex& expected)
-  {
-    for (const int role : Role::All())
-      ASSERT_EQ(shown.data(role), source.data(expected, role)) << NameOf(shown) << " role " << role;
-  };
   ASSERT_EQ(joined.rowCount(), base.subjectRowCount({}));
   for (int row = 0; row < joined.rowCount(); ++row)
   {
     const QModelIndex top = joined.index(row, 0);
     const QModelIndex baseTop = base.index(row, 0);
-    same(top, base, baseTop);
+    ExpectSameRow(top, baseTop);
     int child = 0;
     for (; child < base.subjectRowCount(baseTop); ++child)
-      same(joined.index(child, 0, top), base, base.index(child, 0, baseTop));
+      ExpectSameRow(joined.index(child, 0, top), base.index(child, 0, baseTop));
     for (const auto& elements : base.elementModels())
       for (int element = 0; element < elements->rowCount(baseTop); ++element)
-        same(joined.index(child++, 0, top), *elements, elements->index(element, 0, baseTop));
+        ExpectSameRow(joined.index(child++, 0, top), elements->index(element, 0, baseTop));
     ASSERT_EQ(joined.rowCount(top), child);
   }
 }
@@ -606,20 +504,18 @@ private:
 
 TEST_F(ProxyModelsTest, RandomEditsPassThroughBothProxies)
 {
-  const std::shared_ptr<VSubjectModelStoreBase> bases[] = {
-      NMX::MakeShared<VSubjectListModelStore>(data),
-      NMX::MakeShared<VSubjectTreeModelStore>(data, ESubjectKind::BasicObjects),
-      NMX::MakeShared<VSubjectWithSlotsTreeModelStore>(data, ESubjectKind::CharactersFromClusters)};
+  const std::shared_ptr<VSubjectModelStoreBase> bases[] = {MakeList(), MakeTree(ESubjectKind::BasicObjects),
+                                                           MakeSlotTree()};
   for (const auto& base : bases)
   {
     const auto joined = NMX::MakeShared<VSubjectStoreProxyModel>(base);
     const auto sorted = Sorted(joined);
-    ModelShadow shadow(*joined);
-    ModelShadow sortedShadow(*sorted);
+    ModelShadow shadow(*joined, Untold(*base));
+    ModelShadow sortedShadow(*sorted, Untold(*base));
     Marks marks(*sorted);
     QObject::connect(sorted.get(), &QAbstractItemModel::modelReset, sorted.get(), [&] { marks.wasReset = true; });
-    ProxyEdits edits(20261122);
-    for (int step = 0; step < 4000; ++step)
+    RandomStoreEdits edits(20261122);
+    for (int step = 0; step < 7000; ++step)
     {
       edits.Transaction(*store);
       if (step % 3 != 0)

@@ -1,21 +1,16 @@
-#include "SubjectStoreUI/SubjectGadgets.h"
-#include "SubjectStoreUI/VSubjectListModelStore.h"
-#include "SubjectStoreUI/VSubjectModelInternalData.h"
-#include "SubjectStoreUI/VSubjectTreeModelStore.h"
-#include "SubjectStoreUI/VSubjectWithSlotsTreeModelStore.h"
 #include "SubjectStoreUI/WarningGadget.h"
 #include "tests/Support/LogCapture.h"
-#include "tests/Support/ManualPostal.h"
+#include "tests/Support/ModelFixture.h"
 #include "tests/Support/ModelShadow.h"
-#include "tests/Support/StoreFixture.h"
+#include "tests/Support/RandomStoreEdits.h"
 
-#include <QCoreApplication>
 #include <QElapsedTimer>
 
 #include <gmock/gmock.h>
 
+#include <atomic>
 #include <map>
-#include <random>
+#include <thread>
 
 using namespace SubjectStoreUI;
 using NMX::ESubjectKind;
@@ -27,35 +22,32 @@ namespace Role = SubjectsModelRole;
 namespace
 {
 
-class SubjectModelsTest : public StoreFixture
+class SubjectModelsTest : public ModelFixture
 {
 protected:
-  std::shared_ptr<VSubjectListModelStore> MakeList() { return NMX::MakeShared<VSubjectListModelStore>(data, &summary); }
-
-  static NMX::TSubjectStoreId IdAt(const QModelIndex& index)
+  Names Sentences() const
   {
-    return index.data(Role::SubjectStoreId).value<VStoreIdGadget>().Id();
-  }
-
-  static std::vector<std::string> Names(const QAbstractItemModel& model, const QModelIndex& parent = {})
-  {
-    std::vector<std::string> names;
-    for (int row = 0; row < model.rowCount(parent); ++row)
-      names.push_back(model.index(row, 0, parent).data(Role::SubjectName).toString().toStdString());
-    return names;
-  }
-
-  std::vector<std::string> Sentences() const
-  {
-    std::vector<std::string> sentences;
+    Names sentences;
     for (const QVariant& warning : summary.subjectWarnings())
       sentences.push_back(warning.value<VWarningGadget>().text.toStdString());
     return sentences;
   }
 
-  std::shared_ptr<ManualPostal> gui = std::make_shared<ManualPostal>();
-  std::shared_ptr<VSubjectModelInternalData> data = std::make_shared<VSubjectModelInternalData>(store, gui);
-  VSubjectWarningSummary summary;
+  /// The list and both trees.
+  std::vector<std::shared_ptr<VSubjectModelStoreBase>> MakeEach()
+  {
+    return {MakeList(), MakeTree(ESubjectKind::GeneralSubjects), MakeSlotTree()};
+  }
+
+  /// What is told of each.
+  static std::vector<std::unique_ptr<ModelShadow>>
+  Shadow(const std::vector<std::shared_ptr<VSubjectModelStoreBase>>& models)
+  {
+    std::vector<std::unique_ptr<ModelShadow>> shadows;
+    for (const auto& model : models)
+      shadows.push_back(std::make_unique<ModelShadow>(*model, Untold(*model)));
+    return shadows;
+  }
 };
 
 std::vector<NMX::Slot> NamedSlots(std::initializer_list<const char*> names)
@@ -78,7 +70,7 @@ TEST_F(SubjectModelsTest, TheListIsInTheOrderOfIdsAndSaysWhatTheStoreSays)
   Set(crate, Paths::FilePath(), std::wstring(L"/\u00e4.vsk"));
   const auto model = MakeList();
   const ModelShadow shadow(*model);
-  EXPECT_THAT(Names(*model), ElementsAre("Glove", "Crate"));
+  EXPECT_THAT(NamesBeneath(*model), ElementsAre("Glove", "Crate"));
   const QModelIndex first = model->index(0, 0);
   const QModelIndex second = model->index(1, 0);
   EXPECT_EQ(IdAt(first), glove);
@@ -151,7 +143,7 @@ TEST_F(SubjectModelsTest, ARowIsToldOfInTheRolesThatChanged)
 {
   const Id glove = Add(ESubjectKind::SmartObjects, "Glove");
   const auto list = MakeList();
-  const auto tree = NMX::MakeShared<VSubjectTreeModelStore>(data, ESubjectKind::SmartObjects);
+  const auto tree = MakeTree(ESubjectKind::SmartObjects);
   std::vector<QList<int>> ofList;
   std::vector<QList<int>> ofTree;
   const auto record = [](QAbstractItemModel& model, std::vector<QList<int>>& told)
@@ -207,8 +199,6 @@ TEST_F(SubjectModelsTest, AnEmptyStoreResetsTheModelAndItsSummary)
 
 TEST_F(SubjectModelsTest, ChangesOfAnIntervalCostOneRefresh)
 {
-  int argumentCount = 0;
-  const QCoreApplication application(argumentCount, nullptr);
   const auto eager = MakeList();
   ModelShadow eagerShadow(*eager);
   eager->followStore(0);
@@ -247,14 +237,14 @@ TEST_F(SubjectModelsTest, TheTreeShowsChildrenBeneathTheSubjectsOfItsKind)
   const Id hand = Add(ESubjectKind::Props, "Hand");
   Set(hand, Paths::ParentSubjectId(), arm);
   Set(hand, Paths::WarningObjectConfusion(), true);
-  const auto tree = NMX::MakeShared<VSubjectTreeModelStore>(data, ESubjectKind::GeneralSubjects, &summary);
+  const auto tree = MakeTree(ESubjectKind::GeneralSubjects);
   ModelShadow shadow(*tree);
   Set(arm, Paths::ParentSubjectId(), body);
   tree->refresh();
   shadow.Check();
-  EXPECT_THAT(Names(*tree), ElementsAre("Body", "Arm")) << "a subject may be at both levels";
+  EXPECT_THAT(NamesBeneath(*tree), ElementsAre("Body", "Arm")) << "a subject may be at both levels";
   const QModelIndex first = tree->index(0, 0);
-  EXPECT_THAT(Names(*tree, first), ElementsAre("Arm"));
+  EXPECT_THAT(NamesBeneath(*tree, first), ElementsAre("Arm"));
   const QModelIndex child = tree->index(0, 0, first);
   EXPECT_EQ(tree->rowCount(child), 0) << "although it has a child in the store";
   EXPECT_EQ(tree->parent(child), first);
@@ -272,7 +262,7 @@ TEST_F(SubjectModelsTest, TheTreeShowsChildrenBeneathTheSubjectsOfItsKind)
 
   // A child that only changes is told of once, and one that goes, too.
   tree->refresh();
-  EXPECT_THAT(Names(*tree, first), ElementsAre("Left arm"));
+  EXPECT_THAT(NamesBeneath(*tree, first), ElementsAre("Left arm"));
   shadow.changes = 0;
   Set(hand, Paths::Enabled(), false);
   tree->refresh();
@@ -287,7 +277,7 @@ TEST_F(SubjectModelsTest, TheTreeShowsChildrenBeneathTheSubjectsOfItsKind)
 
 TEST_F(SubjectModelsTest, ANewSubjectArrivesBeforeItsChildrenWhichArriveTogether)
 {
-  const auto tree = NMX::MakeShared<VSubjectTreeModelStore>(data, ESubjectKind::GeneralSubjects);
+  const auto tree = MakeTree(ESubjectKind::GeneralSubjects);
   ModelShadow shadow(*tree);
   std::vector<std::string> told;
   QObject::connect(tree.get(), &QAbstractItemModel::rowsInserted, tree.get(),
@@ -317,11 +307,10 @@ TEST_F(SubjectModelsTest, SlotsAreRowsFilledOrNot)
   };
   fill(glove, 2);
   Set(glove, Paths::WarningObjectConfusion(), true);
-  const auto tree =
-      NMX::MakeShared<VSubjectWithSlotsTreeModelStore>(data, ESubjectKind::CharactersFromClusters, &summary);
+  const auto tree = MakeSlotTree();
   ModelShadow shadow(*tree);
   const QModelIndex character = tree->index(0, 0);
-  EXPECT_THAT(Names(*tree, character), ElementsAre("", "Glove", ""));
+  EXPECT_THAT(NamesBeneath(*tree, character), ElementsAre("", "Glove", ""));
   const QModelIndex empty = tree->index(0, 0, character);
   const QModelIndex filled = tree->index(1, 0, character);
   const struct
@@ -358,160 +347,80 @@ TEST_F(SubjectModelsTest, SlotsAreRowsFilledOrNot)
   fill(glove, 1);
   tree->refresh();
   shadow.Check();
-  EXPECT_THAT(Names(*tree, character), ElementsAre("Mitten", "", ""));
+  EXPECT_THAT(NamesBeneath(*tree, character), ElementsAre("Mitten", "", ""));
   EXPECT_EQ(shadow.inserts + shadow.removals + shadow.resets, 0) << "the slots are the same";
   Set(ada, Paths::Slots(), std::vector<NMX::Slot>{{Id(3), "z"}, {Id(1), "Hand"}, {Id(1), "Twice"}, {Id(), "No id"}});
   tree->refresh();
   shadow.Check();
-  EXPECT_THAT(Names(*tree, character), ElementsAre("", "Mitten"));
+  EXPECT_THAT(NamesBeneath(*tree, character), ElementsAre("", "Mitten"));
   shadow.changes = 0;
   tree->refresh();
   EXPECT_EQ(shadow.changes + shadow.resets, 0);
 }
 
-namespace
-{
-
-/// Edits of everything that models show, in one transaction each.
-class RandomEdits
-{
-public:
-  explicit RandomEdits(unsigned seed) : m_random(seed) {}
-
-  void Transaction(NMX::IStore& store)
-  {
-    const auto editor = store.Editor();
-    for (int edits = Below(3); edits >= 0; --edits)
-      Edit(*editor);
-    EXPECT_TRUE(editor->Commit().Succeeded());
-  }
-
-private:
-  using Id = NMX::TSubjectStoreId;
-
-  int Below(int limit) { return static_cast<int>(m_random() % static_cast<unsigned>(limit)); }
-
-  Id Any(const NMX::IStoreReader& access)
-  {
-    std::vector<Id> all;
-    for (const ESubjectKind kind : NMX::allSubjectKinds)
-    {
-      std::vector<Id> ids;
-      EXPECT_TRUE(access.Subjects(kind, ids).Succeeded());
-      all.insert(all.end(), ids.begin(), ids.end());
-    }
-    return all.empty() ? Id{} : all[static_cast<std::size_t>(Below(static_cast<int>(all.size())))];
-  }
-
-  void Edit(NMX::IEntryEditor& editor)
-  {
-    const Id id = Any(editor);
-    const std::string name = "Subject " + std::to_string(++m_names);
-    constexpr ESubjectKind kinds[] = {ESubjectKind::BasicObjects, ESubjectKind::SmartObjects,
-                                      ESubjectKind::CharactersFromClusters, ESubjectKind::GeneralSubjects,
-                                      ESubjectKind::Props};
-    Id added;
-    // Mostly so many that they come and go, and now and then none.
-    switch (id.Valid() ? Below(m_names % 2000 < 60 ? 2 : 11) : 1)
-    {
-    case 0:
-      (void)editor.Remove(id);
-      break;
-    case 1:
-      if (m_names % 2000 >= 60 || !id.Valid())
-        (void)editor.Add(kinds[Below(5)], name, added);
-      else
-        (void)editor.Remove(id);
-      break;
-    case 2:
-      (void)editor.Rename(id, name, NMX::ENotify::Yes);
-      break;
-    case 3:
-      (void)editor.SetValue(id, Paths::Enabled(), Below(2) != 0);
-      break;
-    case 4:
-      (void)editor.SetValue(id, Paths::WarningObjectConfusion(), Below(2) != 0);
-      break;
-    case 5:
-      (void)editor.SetValue(id, Paths::ParentSubjectId(), Below(3) == 0 ? Id{} : Any(editor));
-      break;
-    case 6:
-      (void)editor.SetValue(id, Paths::ParentSubjectSlotId(), Id(Below(5)));
-      break;
-    case 7:
-      (void)editor.SetValue(id, Paths::Slots(), RandomSlots());
-      break;
-    case 8:
-      (void)editor.SetValue(
-          id, Paths::SmartClusters(),
-          std::vector<NMX::SmartCluster>(static_cast<std::size_t>(Below(3)), {"C", name, 1, "Corvex1"}));
-      break;
-    case 9:
-      (void)editor.SetValue(id, Paths::Markers(),
-                            std::vector<NMX::Position>(static_cast<std::size_t>(Below(4)), {1.0 * m_names, 2, 3}));
-      break;
-    default:
-      (void)editor.SetValue(id, Paths::AutoAssignEnabled(), Below(4) == 0);
-    }
-  }
-
-  /// Some of five slots, in any order.
-  std::vector<NMX::Slot> RandomSlots()
-  {
-    std::vector<NMX::Slot> made;
-    for (std::uint64_t slot = 1; slot <= 5; ++slot)
-      if (Below(3) != 0)
-        made.push_back({Id(slot), "Slot " + std::to_string(Below(3))});
-    std::shuffle(made.begin(), made.end(), m_random);
-    return made;
-  }
-
-  std::mt19937 m_random;
-  int m_names = 0;
-};
-
-}
-
 TEST_F(SubjectModelsTest, RandomEditsAreToldOfExactly)
 {
-  const auto list = MakeList();
-  const auto tree = NMX::MakeShared<VSubjectTreeModelStore>(data, ESubjectKind::GeneralSubjects);
-  const auto slots = NMX::MakeShared<VSubjectWithSlotsTreeModelStore>(data, ESubjectKind::CharactersFromClusters);
-  std::map<NMX::TSubjectStoreId, QPersistentModelIndex> marked;
-  const QList<int> ofDevices{Role::SubjectSmartClusterDeviceNames, Role::SubjectPatterns}; // trees do not tell of them
-  ModelShadow shadows[] = {ModelShadow(*list), ModelShadow(*tree, ofDevices), ModelShadow(*slots, ofDevices)};
-  RandomEdits edits(20261121);
+  const auto models = MakeEach();
+  const auto shadows = Shadow(models);
+  const VSubjectModelStoreBase& list = *models[0];
+  std::map<Id, QPersistentModelIndex> marked;
+  RandomStoreEdits edits(20261121);
   for (int step = 0; step < 20000; ++step)
   {
     edits.Transaction(*store);
     if (step % 3 == 0)
-      for (VSubjectModelStoreBase* model :
-           {static_cast<VSubjectModelStoreBase*>(list.get()), static_cast<VSubjectModelStoreBase*>(tree.get()),
-            static_cast<VSubjectModelStoreBase*>(slots.get())})
+      for (const auto& model : models)
         model->refresh();
     if (step % 60 != 0)
       continue;
-    for (const ModelShadow& shadow : shadows)
-      shadow.Check();
-    const auto fresh = NMX::MakeShared<VSubjectListModelStore>(data);
-    ASSERT_EQ(Names(*list), Names(*fresh));
-    for (auto mark = marked.begin(); mark != marked.end();)
+    const auto fresh = MakeEach();
+    for (std::size_t model = 0; model < models.size(); ++model)
     {
-      if (!list->indexForSubject(mark->first).isValid())
-        ASSERT_FALSE(mark->second.isValid()) << "its row has gone";
-      else
-        ASSERT_EQ(QModelIndex(mark->second), list->indexForSubject(mark->first));
-      mark = mark->second.isValid() ? std::next(mark) : marked.erase(mark);
+      shadows[model]->Check();
+      ExpectSame(*models[model], *fresh[model]);
     }
-    if (list->rowCount() > 0)
-    {
-      const QModelIndex any = list->index(step / 60 % list->rowCount(), 0);
-      marked.insert_or_assign(IdAt(any), any);
-    }
+    for (const auto& [subject, row] : marked)
+      ASSERT_EQ(QModelIndex(row), list.indexForSubject(subject)) << "also when it has gone";
+    std::erase_if(marked, [](const auto& mark) { return !mark.second.isValid(); });
+    if (const int rows = list.rowCount({}); rows > 0)
+      marked.insert_or_assign(IdAt(list.index(step / 60 % rows, 0)), list.index(step / 60 % rows, 0));
     if (HasFailure())
       FAIL() << "step " << step;
   }
-  EXPECT_GT(shadows[0].resets, 0);
-  EXPECT_GT(shadows[0].removals, 100);
-  EXPECT_GT(shadows[2].inserts, 1000);
+  EXPECT_GT(shadows[0]->resets, 0);
+  EXPECT_GT(shadows[0]->removals, 100);
+  EXPECT_GT(shadows[2]->inserts, 1000);
+}
+
+TEST_F(SubjectModelsTest, EditsOfOtherThreadsAreFollowed)
+{
+  const auto models = MakeEach();
+  const auto shadows = Shadow(models);
+  for (const auto& model : models)
+    model->followStore(0);
+  std::atomic<int> commits = 0;
+  std::atomic<int> editing = 3;
+  {
+    std::vector<std::jthread> threads;
+    for (const unsigned seed : {20261123U, 20261124U, 20261125U})
+      threads.emplace_back(
+          [&, seed]
+          {
+            for (RandomStoreEdits edits(seed); commits++ < 2000;)
+              edits.Transaction(*store);
+            --editing;
+          });
+    while (editing > 0)
+      if (gui->RunAll() == 0)
+        std::this_thread::yield();
+  }
+  EXPECT_GT(archive.commits, 1000);
+  gui->RunAll();
+  const auto fresh = MakeEach();
+  for (std::size_t model = 0; model < models.size(); ++model)
+  {
+    shadows[model]->Check();
+    ExpectSame(*models[model], *fresh[model]);
+    EXPECT_GT(shadows[model]->inserts, 10);
+  }
 }
