@@ -40,6 +40,11 @@ public:
   /// `NotSupported` when no pattern set serves the types of cluster together.
   virtual NMX::IResult CreateForUnlinkedDevices(std::vector<std::string>& names) = 0;
 
+  /// The same for these devices, or only a check of it. `AlreadyPresent` for one that is linked to a cluster, or comes
+  /// twice; `InvalidArgument` without any.
+  virtual NMX::IResult CreateForDevices(const std::vector<std::string>& urns, ECreate create,
+                                        std::vector<std::string>& names) = 0;
+
   /// Gives every cluster a pattern of its own, from the smallest set that has enough; those beyond the largest get 0.
   /// `NotFound` for an unknown type of cluster, `NotSupported` as above.
   virtual NMX::IResult AssignOptimalPatterns() = 0;

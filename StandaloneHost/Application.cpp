@@ -58,10 +58,11 @@ void LoadConfigurations(Store::VStore& store, const Options& options)
 
 void SetUpSettings(Store::VStore& store, const VFileLocations& locations)
 {
-  const NMX::IResult set = Settings::SetUpPanelSettings(
-      store,
-      {locations.Folders("CharacterTemplates"), locations.Folders("SmartObjectTemplates"),
-       locations.Folders("LabellingTemplates"), locations.Folders("SubjectSkins"), locations.Folders("Retargets")});
+  const NMX::IResult set = Settings::SetUpPanelSettings(store, {locations.Folders(IFileLocations::characterTemplates),
+                                                                locations.Folders(IFileLocations::smartObjectTemplates),
+                                                                locations.Folders(IFileLocations::subjectTemplates),
+                                                                locations.Folders(IFileLocations::subjectSkins),
+                                                                locations.Folders(IFileLocations::retargets)});
   if (set.Failed())
     NMX::Log(NMX::systemLog, NMX::ESeverity::Error, "The settings cannot be brought up to date: %1%", set.Name());
 }

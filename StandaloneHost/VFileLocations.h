@@ -4,7 +4,6 @@
 
 #include <filesystem>
 #include <optional>
-#include <string_view>
 #include <vector>
 
 /// Files that come with the host, beside its program, and then those in the data folder, if there is one. [any]
@@ -14,9 +13,10 @@ public:
   explicit VFileLocations(std::optional<std::filesystem::path> dataFolder);
 
   [[nodiscard]] std::vector<std::wstring> Directories(std::uint32_t location) const override;
+  [[nodiscard]] std::wstring UserDirectory(std::uint32_t location) const override;
 
-  /// The folders of that name, such as "SmartObjectTemplates", in the order in which they are searched.
-  [[nodiscard]] std::vector<std::filesystem::path> Folders(std::string_view name) const;
+  /// What Directories answers, as paths.
+  [[nodiscard]] std::vector<std::filesystem::path> Folders(std::uint32_t location) const;
 
 private:
   const std::optional<std::filesystem::path> m_dataFolder;

@@ -1,10 +1,13 @@
 #pragma once
 
 #include "HostInterface/NMX/ITypedId.h"
+#include "HostInterface/SelectionItem.h"
 
 #include <QMetaType>
 #include <QObject>
 #include <QString>
+
+#include <utility>
 
 namespace SubjectStoreUI
 {
@@ -34,26 +37,33 @@ private:
   NMX::TSubjectStoreId m_id;
 };
 
-/// What a row stands for in a selection: a subject, or a slot of a character.
+/// What a row stands for in a selection: a subject, a slot of a character, or a device.
 class VSelectionItemGadget
 {
   Q_GADGET
   Q_PROPERTY(SubjectStoreUI::VStoreIdGadget subject READ Subject CONSTANT)
   Q_PROPERTY(int slot READ Slot CONSTANT)
+  Q_PROPERTY(QString device READ Device CONSTANT)
 
 public:
   VSelectionItemGadget() = default;
   /// `slot` is the slot's position; -1 for the subject itself.
-  explicit VSelectionItemGadget(NMX::TSubjectStoreId subject, int slot = -1) : m_subject(subject), m_slot(slot) {}
+  explicit VSelectionItemGadget(NMX::TSubjectStoreId subject, int slot = -1) : m_item{subject, slot, {}} {}
+  explicit VSelectionItemGadget(SelectionItem item) : m_item(std::move(item)) {}
 
-  [[nodiscard]] VStoreIdGadget Subject() const { return VStoreIdGadget(m_subject); }
-  [[nodiscard]] int Slot() const { return m_slot; }
+  [[nodiscard]] const SelectionItem& Item() const { return m_item; }
+  [[nodiscard]] VStoreIdGadget Subject() const { return VStoreIdGadget(m_item.subject); }
+  [[nodiscard]] int Slot() const { return m_item.slot; }
+  [[nodiscard]] QString Device() const { return QString::fromStdString(m_item.device); }
+  Q_INVOKABLE [[nodiscard]] bool equals(const SubjectStoreUI::VSelectionItemGadget& other) const
+  {
+    return *this == other;
+  }
 
   friend bool operator==(const VSelectionItemGadget&, const VSelectionItemGadget&) = default;
 
 private:
-  NMX::TSubjectStoreId m_subject;
-  int m_slot = -1;
+  SelectionItem m_item;
 };
 
 /// A place in mm.

@@ -154,6 +154,45 @@ std::string NameFor(NMX::IEntryEditor& editor, const Device& device)
   return name;
 }
 
+/// Adds a smart object for each of the devices and gives it a pattern.
+IResult AddForDevices(NMX::IEntryEditor& editor, const std::vector<Device>& devices, std::vector<std::string>& names)
+{
+  std::set<std::string> types;
+  std::set<std::uint32_t> patterns;
+  if (const IResult visited = ForEachCluster(editor,
+                                             [&](const NMX::SmartCluster& cluster)
+                                             {
+                                               types.insert(cluster.type);
+                                               if (cluster.pattern != 0)
+                                                 patterns.insert(cluster.pattern);
+                                             });
+      visited.Failed())
+    return visited;
+  for (const Device& device : devices)
+    if (device.type != supportedType)
+    {
+      NMX::Log(NMX::subjectStoreLog, NMX::ESeverity::Error,
+               "No smart object can be made for device \"%1%\" of type \"%2%\"", device.urn, device.type);
+      return EResult::NotFound;
+    }
+  types.emplace(supportedType);
+  if (types.size() > 1)
+    return EResult::NotSupported;
+  if (devices.size() > patternSetSizes.back() - std::min<std::size_t>(patterns.size(), patternSetSizes.back()))
+    return EResult::AllocationFailure;
+
+  std::vector<TSubjectStoreId> objects;
+  for (const Device& device : devices)
+  {
+    names.push_back(NameFor(editor, device));
+    if (const IResult added =
+            AddObject(editor, names.back(), {{"Cluster", device.urn, 0, device.type}}, {}, objects.emplace_back());
+        added.Failed())
+      return added;
+  }
+  return GivePatterns(editor, objects);
+}
+
 }
 
 VSmartObjectControls::VSmartObjectControls(std::shared_ptr<NMX::IStore> store,
@@ -195,49 +234,50 @@ IResult VSmartObjectControls::CreateForUnlinkedDevices(std::vector<std::string>&
 {
   const auto editor = m_store->Editor();
   std::set<std::string> linked;
-  std::set<std::string> types;
-  std::set<std::uint32_t> patterns;
-  if (const IResult visited = ForEachCluster(*editor,
-                                             [&](const NMX::SmartCluster& cluster)
-                                             {
-                                               linked.insert(cluster.deviceUrn);
-                                               types.insert(cluster.type);
-                                               if (cluster.pattern != 0)
-                                                 patterns.insert(cluster.pattern);
-                                             });
+  if (const IResult visited =
+          ForEachCluster(*editor, [&](const NMX::SmartCluster& cluster) { linked.insert(cluster.deviceUrn); });
       visited.Failed())
     return visited;
-
   std::vector<Device> devices = Devices(*editor);
   std::erase_if(devices, [&](const Device& device) { return linked.contains(device.urn); });
   if (devices.empty())
     return EResult::Ok;
-  for (const Device& device : devices)
-    if (device.type != supportedType)
-    {
-      NMX::Log(NMX::subjectStoreLog, NMX::ESeverity::Error,
-               "No smart object can be made for device \"%1%\" of type \"%2%\"", device.urn, device.type);
-      return EResult::NotFound;
-    }
-  types.emplace(supportedType);
-  if (types.size() > 1)
-    return EResult::NotSupported;
-  if (devices.size() > patternSetSizes.back() - std::min<std::size_t>(patterns.size(), patternSetSizes.back()))
-    return EResult::AllocationFailure;
-
   std::vector<std::string> made;
-  std::vector<TSubjectStoreId> objects;
-  for (const Device& device : devices)
-  {
-    made.push_back(NameFor(*editor, device));
-    if (const IResult added =
-            AddObject(*editor, made.back(), {{"Cluster", device.urn, 0, device.type}}, {}, objects.emplace_back());
-        added.Failed())
-      return added;
-  }
-  if (const IResult given = GivePatterns(*editor, objects); given.Failed())
-    return given;
+  if (const IResult added = AddForDevices(*editor, devices, made); added.Failed())
+    return added;
   const IResult kept = editor->Commit();
+  if (kept.Succeeded())
+    names = std::move(made);
+  return kept;
+}
+
+IResult VSmartObjectControls::CreateForDevices(const std::vector<std::string>& urns, ECreate create,
+                                               std::vector<std::string>& names)
+{
+  if (urns.empty())
+    return EResult::InvalidArgument;
+  const auto editor = m_store->Editor();
+  std::set<std::string> taken;
+  if (const IResult visited =
+          ForEachCluster(*editor, [&](const NMX::SmartCluster& cluster) { taken.insert(cluster.deviceUrn); });
+      visited.Failed())
+    return visited;
+  const std::vector<Device> known = Devices(*editor);
+  std::vector<Device> devices;
+  for (const std::string& urn : urns)
+  {
+    const auto device =
+        std::find_if(known.begin(), known.end(), [&](const Device& candidate) { return candidate.urn == urn; });
+    if (device == known.end())
+      return EResult::NotFound;
+    if (!taken.insert(urn).second)
+      return EResult::AlreadyPresent;
+    devices.push_back(*device);
+  }
+  std::vector<std::string> made;
+  if (const IResult added = AddForDevices(*editor, devices, made); added.Failed())
+    return added;
+  const IResult kept = create == ECreate::Yes ? editor->Commit() : EResult::Ok;
   if (kept.Succeeded())
     names = std::move(made);
   return kept;

@@ -17,6 +17,8 @@ public:
 
   NMX::IResult CreateFromTemplate(const std::string& name, const std::filesystem::path& file, ECreate create) override;
   NMX::IResult CreateForUnlinkedDevices(std::vector<std::string>& names) override;
+  NMX::IResult CreateForDevices(const std::vector<std::string>& urns, ECreate create,
+                                std::vector<std::string>& names) override;
   NMX::IResult AssignOptimalPatterns() override;
   NMX::IResult CheckPattern(const NMX::IStoreReader& access, const std::string& clusterType,
                             std::uint32_t pattern) const override;

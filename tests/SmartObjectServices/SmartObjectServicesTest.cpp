@@ -25,6 +25,8 @@ class MockControls : public ISmartObjectControls
 public:
   MOCK_METHOD(IResult, CreateFromTemplate, (const std::string&, const std::filesystem::path&, ECreate), (override));
   MOCK_METHOD(IResult, CreateForUnlinkedDevices, (std::vector<std::string>&), (override));
+  MOCK_METHOD(IResult, CreateForDevices, (const std::vector<std::string>&, ECreate, std::vector<std::string>&),
+              (override));
   MOCK_METHOD(IResult, AssignOptimalPatterns, (), (override));
   MOCK_METHOD(IResult, CheckPattern, (const NMX::IStoreReader&, const std::string&, std::uint32_t), (const, override));
 };
@@ -35,6 +37,7 @@ struct Locations : IFileLocations
   {
     return location == 1024 ? folders : std::vector<std::wstring>{L"elsewhere"};
   }
+  std::wstring UserDirectory(std::uint32_t /*location*/) const override { return {}; }
   std::vector<std::wstring> folders;
 };
 

@@ -1,0 +1,29 @@
+#pragma once
+
+#include "HostInterface/NMX/IResult.h"
+#include "HostInterface/NMX/ITypedId.h"
+
+namespace NMX
+{
+class IEntryEditor;
+}
+
+namespace RunaCorePluginInterface
+{
+
+/// Gives objects the settings of a preset. [any]
+class IObjectPresetProvider
+{
+public:
+  IObjectPresetProvider() = default;
+  IObjectPresetProvider(const IObjectPresetProvider&) = delete;
+  IObjectPresetProvider& operator=(const IObjectPresetProvider&) = delete;
+  virtual ~IObjectPresetProvider() = default;
+
+  /// Copies the parameters of a preset to a subject, in the given edit access, which the caller commits; the subject
+  /// remembers the preset's name. `NotFound` when there is no such preset, `InvalidType` for a subject that is no
+  /// object; where it fails, the caller lets go of the access.
+  virtual NMX::IResult Apply(NMX::IEntryEditor& access, NMX::TSubjectStoreId preset, NMX::TSubjectStoreId subject) = 0;
+};
+
+}
