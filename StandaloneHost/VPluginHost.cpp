@@ -28,12 +28,12 @@ void VPluginHost::Store(std::shared_ptr<NMX::IStore>& store) const
 
 void VPluginHost::PanelServices(std::shared_ptr<IPanelServices>& services) const
 {
-  services.reset();
+  services = m_services.panel;
 }
 
 void VPluginHost::PostalService(std::shared_ptr<NMX::IPostalService>& postal) const
 {
-  postal.reset();
+  postal = m_services.guiPostal;
 }
 
 void VPluginHost::NotificationPostalService(std::shared_ptr<NMX::IAsioPostalService>& postal) const
@@ -43,12 +43,12 @@ void VPluginHost::NotificationPostalService(std::shared_ptr<NMX::IAsioPostalServ
 
 void VPluginHost::FileIO(std::shared_ptr<IRunaCoreFileIO>& fileIO) const
 {
-  fileIO.reset();
+  fileIO = m_services.fileIO;
 }
 
 void VPluginHost::SelectionManager(std::shared_ptr<ISelectionManager>& selectionManager) const
 {
-  selectionManager.reset();
+  selectionManager = m_services.selection;
 }
 
 void VPluginHost::FlowStateCacheContextProvider(std::shared_ptr<IFlowStateCacheContextProvider>& provider) const
@@ -63,7 +63,7 @@ void VPluginHost::Server(std::shared_ptr<TerminalServer2::IServer>& server) cons
 
 void VPluginHost::ObjectPresetProvider(std::shared_ptr<IObjectPresetProvider>& provider) const
 {
-  provider.reset();
+  provider = m_services.objectPresets;
 }
 
 void VPluginHost::SubjectOriginTools(std::shared_ptr<ISubjectOriginTools>& tools) const
@@ -93,7 +93,7 @@ void VPluginHost::CalibrationProvider(std::shared_ptr<ICalibrationProvider>& pro
 
 void VPluginHost::OfflineStoreServices(std::shared_ptr<IOfflineStoreServices>& services) const
 {
-  services.reset();
+  services = m_services.offlineStore;
 }
 
 void VPluginHost::AccessRights(std::shared_ptr<IAccessRights>& rights) const

@@ -16,6 +16,12 @@ struct HostServices
   std::shared_ptr<RunaCorePluginInterface::IDeviceLayoutRegistry> deviceLayouts;
   std::shared_ptr<RunaCorePluginInterface::ICalibrationProvider> calibration = nullptr;
   std::shared_ptr<RunaCorePluginInterface::IAccessRights> accessRights = nullptr;
+  std::shared_ptr<NMX::IPostalService> guiPostal = nullptr;
+  std::shared_ptr<IRunaCoreFileIO> fileIO = nullptr;
+  std::shared_ptr<ISelectionManager> selection = nullptr;
+  std::shared_ptr<RunaCorePluginInterface::IPanelServices> panel = nullptr;
+  std::shared_ptr<RunaCorePluginInterface::IObjectPresetProvider> objectPresets = nullptr;
+  std::shared_ptr<RunaCorePluginInterface::IOfflineStoreServices> offlineStore = nullptr;
 };
 
 /// The standalone host as the plugin sees it. What it does not have it leaves empty. [host]

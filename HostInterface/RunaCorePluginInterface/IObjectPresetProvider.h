@@ -21,8 +21,9 @@ public:
   virtual ~IObjectPresetProvider() = default;
 
   /// Copies the parameters of a preset to a subject, in the given edit access, which the caller commits; the subject
-  /// remembers the preset's name. `NotFound` when there is no such preset, `InvalidType` for a subject that is no
-  /// object; where it fails, the caller lets go of the access.
+  /// remembers the preset's name. Parameters that the subject does not have are passed over. `NotFound` when there is
+  /// no such preset, `InvalidId` when there is no such subject, `InvalidType` for one that is no object, or a parameter
+  /// of the wrong type; where it fails, the caller lets go of the access.
   virtual NMX::IResult Apply(NMX::IEntryEditor& access, NMX::TSubjectStoreId preset, NMX::TSubjectStoreId subject) = 0;
 };
 

@@ -2,6 +2,7 @@
 
 #include "StandaloneHost/Files/ElementParts.h"
 #include "StandaloneHost/Files/ElementReader.h"
+#include "StandaloneHost/Files/ElementWriter.h"
 
 #include <algorithm>
 #include <array>
@@ -82,6 +83,25 @@ LabellingTemplate ReadLabellingTemplate(const std::filesystem::path& file)
                        {"Roles", EPresence::Optional, readRoles}});
   xml.End();
   return content;
+}
+
+std::string LabellingTemplateText(const LabellingTemplate& content)
+{
+  Files::ElementWriter xml("LabellingTemplate");
+  Files::WriteSegments(xml, content.segments);
+  xml.Open("Children");
+  for (const ChildTemplate& child : content.children)
+  {
+    Files::ElementWriter::Attributes attributes{{"kind", std::string(NMX::KindKey(child.kind))}, {"name", child.name}};
+    if (!child.parent.empty())
+      attributes.emplace_back("parent", child.parent);
+    xml.Add("Child", attributes);
+  }
+  xml.CloseUnlessEmpty();
+  xml.Open("Roles");
+  xml.AddText("Labelling", Files::TextOf(content.labelling));
+  xml.Close();
+  return xml.Finish();
 }
 
 }

@@ -35,4 +35,8 @@ struct LabellingTemplate
 /// Files::ConfigurationError when anything is wrong with its content. [any]
 [[nodiscard]] LabellingTemplate ReadLabellingTemplate(const std::filesystem::path& file);
 
+/// The text of a file from which ReadLabellingTemplate reads the same, if it can be read at all. Throws
+/// Files::ConfigurationError for a text that no file can hold. [any]
+[[nodiscard]] std::string LabellingTemplateText(const LabellingTemplate& content);
+
 }

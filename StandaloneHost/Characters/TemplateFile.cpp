@@ -2,6 +2,7 @@
 
 #include "StandaloneHost/Files/ElementParts.h"
 #include "StandaloneHost/Files/ElementReader.h"
+#include "StandaloneHost/Files/ElementWriter.h"
 
 #include <algorithm>
 #include <cstddef>
@@ -87,6 +88,21 @@ void Reader::ReadRoles(const Element& section)
 CharacterTemplate ReadTemplate(const std::filesystem::path& file)
 {
   return Reader(file).Read();
+}
+
+std::string TemplateText(const CharacterTemplate& content)
+{
+  Files::ElementWriter xml("CharacterTemplate");
+  Files::WriteSegments(xml, content.segments);
+  xml.Open("Slots");
+  for (const SlotTemplate& slot : content.slots)
+    xml.Add("Slot", {{"name", slot.name}, {"segment", slot.segment}});
+  xml.Close();
+  xml.Open("Roles");
+  xml.AddText("Solving", Files::TextOf(content.solving));
+  xml.AddText("Retargeting", Files::TextOf(content.retargeting));
+  xml.Close();
+  return xml.Finish();
 }
 
 }

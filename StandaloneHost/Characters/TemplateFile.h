@@ -34,4 +34,8 @@ struct CharacterTemplate
 /// Files::ConfigurationError when anything is wrong with its content. [any]
 [[nodiscard]] CharacterTemplate ReadTemplate(const std::filesystem::path& file);
 
+/// The text of a file from which ReadTemplate reads the same, if it can be read at all. Throws
+/// Files::ConfigurationError for a text that no file can hold. [any]
+[[nodiscard]] std::string TemplateText(const CharacterTemplate& content);
+
 }

@@ -38,14 +38,19 @@ std::string PlaceText(const Place& place)
   return place.file->string() + ':' + std::to_string(place.line) + ':' + std::to_string(place.column);
 }
 
-void Fail(const Place& place, std::string_view problem)
+void Fail(const Place& place, std::string_view problem, NMX::IResult result)
 {
-  throw ConfigurationError(Message(place, problem));
+  throw ConfigurationError(Message(place, problem), result);
 }
 
-void FailUnreadable(const std::filesystem::path& file, std::string_view problem)
+void FailUnreadable(const std::filesystem::path& file, std::string_view problem, NMX::IResult result)
 {
-  throw UnreadableFileError(Message({&file}, problem));
+  throw UnreadableFileError(Message({&file}, problem), result);
+}
+
+void FailUnwritable(const std::filesystem::path& file, std::string_view problem, NMX::IResult result)
+{
+  throw ConfigurationError(OnOneLine(file.string() + ": the file cannot be written: " + std::string(problem)), result);
 }
 
 std::string Quoted(std::string_view text)

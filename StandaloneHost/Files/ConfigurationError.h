@@ -1,5 +1,7 @@
 #pragma once
 
+#include "HostInterface/NMX/IResult.h"
+
 #include <cstdint>
 #include <filesystem>
 #include <span>
@@ -10,12 +12,21 @@
 namespace Files
 {
 
-/// Why a subject configuration could not be loaded, as one line for people:
-/// "FILE:LINE:COLUMN: what is wrong, what was expected".
+/// Why a file of subjects could not be read or written, as one line for people, and as a result. What is wrong with a
+/// file that is read begins with its place: "FILE:LINE:COLUMN: what is wrong, what was expected".
 class ConfigurationError : public std::runtime_error
 {
 public:
-  using std::runtime_error::runtime_error;
+  explicit ConfigurationError(const std::string& text, NMX::IResult result = NMX::EResult::SerialisationFailure)
+      : std::runtime_error(text), m_result(result)
+  {
+  }
+
+  /// `SerialisationFailure` unless something else than the file's content is the reason.
+  [[nodiscard]] NMX::IResult Result() const { return m_result; }
+
+private:
+  NMX::IResult m_result;
 };
 
 /// The same, when nothing is wrong with what the file says but the file itself cannot be read: it is missing, no
@@ -23,7 +34,7 @@ public:
 class UnreadableFileError : public ConfigurationError
 {
 public:
-  using ConfigurationError::ConfigurationError;
+  UnreadableFileError(const std::string& text, NMX::IResult result) : ConfigurationError(text, result) {}
 };
 
 /// Where something stands in a file. Lines and columns count from 1, columns in characters.
@@ -38,10 +49,15 @@ struct Place
 [[nodiscard]] std::string PlaceText(const Place& place);
 
 /// Throws the ConfigurationError that tells of a problem at a place.
-[[noreturn]] void Fail(const Place& place, std::string_view problem);
+[[noreturn]] void Fail(const Place& place, std::string_view problem,
+                       NMX::IResult result = NMX::EResult::SerialisationFailure);
 
 /// Throws the UnreadableFileError that tells why a file cannot be read.
-[[noreturn]] void FailUnreadable(const std::filesystem::path& file, std::string_view problem);
+[[noreturn]] void FailUnreadable(const std::filesystem::path& file, std::string_view problem,
+                                 NMX::IResult result = NMX::EResult::FileIOFailure);
+
+/// Throws the ConfigurationError that tells why a file cannot be written.
+[[noreturn]] void FailUnwritable(const std::filesystem::path& file, std::string_view problem, NMX::IResult result);
 
 /// Text of a file as messages quote it; what is too long is cut.
 [[nodiscard]] std::string Quoted(std::string_view text);

@@ -34,7 +34,7 @@ class Writer
 public:
   explicit Writer(NMX::IEntryEditor& editor) : m_editor(editor) {}
 
-  void AddDevices(const std::vector<DeviceContent>& devices);
+  void AddDevices(const std::vector<DeviceContent>& devices, EKnownDevices known);
   void AddPresets(const std::vector<PresetContent>& presets);
   void AddSubjects(const std::vector<SubjectContent>& subjects);
   void LinkSubjects(const std::vector<SubjectContent>& subjects);
@@ -59,13 +59,15 @@ private:
   Places<TSubjectStoreId> m_fillings; // by the object
 };
 
-void Writer::AddDevices(const std::vector<DeviceContent>& devices)
+void Writer::AddDevices(const std::vector<DeviceContent>& devices, EKnownDevices known)
 {
   Places<std::string_view> urns;
   for (const DeviceContent& device : devices)
   {
     CheckUnique<std::string_view>(urns, device.urn, device.place, "device " + Quoted(device.urn));
     const std::string path = "Application/Devices/" + device.urn;
+    if (known == EKnownDevices::Keep && m_editor.FindApplicationEntry(NMX::EntryPath(path + "/Type")) != nullptr)
+      continue;
     SetApplicationEntry(device.place, path + "/Type", device.type);
     SetApplicationEntry(device.place, path + "/Connected", device.connected);
     SetApplicationEntry(device.place, path + "/Charging", device.charging);
@@ -105,10 +107,13 @@ void Writer::AddSubject(const SubjectContent& subject)
   TSubjectStoreId id;
   const IResult added = m_editor.Add(subject.kind, subject.name, id);
   if (added == EResult::InvalidName)
-    Fail(subject.place, "the store refuses the name " + Quoted(subject.name) +
-                            " (InvalidName), expected one that matches " + m_editor.NamePattern());
+    Fail(subject.place,
+         "the store refuses the name " + Quoted(subject.name) + " (InvalidName), expected one that matches " +
+             m_editor.NamePattern(),
+         added);
   if (added.Failed())
-    Fail(subject.place, "the store refuses the subject " + Quoted(subject.name) + ": " + std::string(added.Name()));
+    Fail(subject.place, "the store refuses the subject " + Quoted(subject.name) + ": " + std::string(added.Name()),
+         added);
   m_added.emplace(subject.name, Added{id, &subject});
   for (const EntryContent& entry : subject.entries)
     SetValue(entry.place, id, entry.path, entry.value);
@@ -141,7 +146,7 @@ void Writer::SetParent(const Place& place, TSubjectStoreId child, TSubjectStoreI
   if (set == EResult::InvalidValue)
     Fail(place, what + " would make a subject its own ancestor, expected subjects without a cycle");
   if (set.Failed())
-    Fail(place, "the store refuses the " + what + ": " + std::string(set.Name()));
+    Fail(place, "the store refuses the " + what + ": " + std::string(set.Name()), set);
 }
 
 void Writer::FillSlot(const Added& character, const FillingContent& filling)
@@ -164,24 +169,24 @@ void Writer::FillSlot(const Added& character, const FillingContent& filling)
 void Writer::SetValue(const Place& place, TSubjectStoreId id, NMX::EntryPath path, NMX::Value value)
 {
   if (const IResult set = m_editor.SetValue(id, path, std::move(value)); set.Failed())
-    Fail(place, "the store refuses the value of " + std::string(path.Text()) + ": " + std::string(set.Name()));
+    Fail(place, "the store refuses the value of " + std::string(path.Text()) + ": " + std::string(set.Name()), set);
 }
 
 void Writer::SetApplicationEntry(const Place& place, const std::string& path, NMX::Value value)
 {
   // The loading adds; it never replaces what was set before.
   if (m_editor.FindApplicationEntry(NMX::EntryPath(path)) != nullptr)
-    Fail(place, "the store already holds " + Quoted(path) + ", expected it to be new");
+    Fail(place, "the store already holds " + Quoted(path) + ", expected it to be new", EResult::AlreadyPresent);
   if (const IResult set = m_editor.SetApplicationEntry(NMX::EntryPath(path), std::move(value)); set.Failed())
-    Fail(place, "the store refuses " + Quoted(path) + ": " + std::string(set.Name()));
+    Fail(place, "the store refuses " + Quoted(path) + ": " + std::string(set.Name()), set);
 }
 
 }
 
-void WriteConfiguration(const ConfigurationContent& content, NMX::IEntryEditor& editor)
+void WriteConfiguration(const ConfigurationContent& content, NMX::IEntryEditor& editor, EKnownDevices known)
 {
   Writer writer(editor);
-  writer.AddDevices(content.devices);
+  writer.AddDevices(content.devices, known);
   writer.AddPresets(content.presets);
   writer.AddSubjects(content.subjects);
   writer.LinkSubjects(content.subjects);

@@ -61,4 +61,12 @@ std::vector<NMX::Position> ReadMarkers(ElementReader& xml)
   return markers;
 }
 
+void WriteMarkers(ElementWriter& xml, std::string_view name, const std::vector<NMX::Position>& markers)
+{
+  xml.Open(name);
+  for (const NMX::Position& marker : markers)
+    xml.Add("Marker", {{"x", TextOf(marker.x)}, {"y", TextOf(marker.y)}, {"z", TextOf(marker.z)}});
+  xml.CloseUnlessEmpty();
+}
+
 }

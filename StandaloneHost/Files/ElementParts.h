@@ -1,6 +1,7 @@
 #pragma once
 
 #include "StandaloneHost/Files/ElementReader.h"
+#include "StandaloneHost/Files/ElementWriter.h"
 #include "StandaloneHost/Files/ValueText.h"
 #include "StoreInterface/Value.h"
 
@@ -99,5 +100,8 @@ void ReadSections(ElementReader& xml, const Element& parent, std::initializer_li
 
 /// The places of the markers that the element that was entered last consists of.
 [[nodiscard]] std::vector<NMX::Position> ReadMarkers(ElementReader& xml);
+
+/// Writes the element from which ReadMarkers reads these; none when there are no markers.
+void WriteMarkers(ElementWriter& xml, std::string_view name, const std::vector<NMX::Position>& markers);
 
 }

@@ -10,8 +10,8 @@
 namespace Files
 {
 
-/// The result for the failure to read a file that is being handled: `FileIOFailure` when the file itself cannot be
-/// read, `SerialisationFailure` when its content is wrong. Logs "The WHAT cannot be used: " and why.
+/// The result for the failure to read a file that is being handled, a ConfigurationError: `FileIOFailure` when the file
+/// itself cannot be read, `SerialisationFailure` when its content is wrong. Logs "The WHAT cannot be used: " and why.
 NMX::IResult ReportUnusable(std::string_view what);
 
 /// Reads a file of one sort, which messages call `what`: `content = read(file)`. `InvalidArgument` for an empty path,

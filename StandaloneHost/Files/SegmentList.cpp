@@ -46,4 +46,17 @@ std::vector<Segment> ReadSegments(ElementReader& xml, const Element& list)
   return segments;
 }
 
+void WriteSegments(ElementWriter& xml, const std::vector<Segment>& segments)
+{
+  xml.Open("Segments");
+  for (const Segment& segment : segments)
+  {
+    ElementWriter::Attributes attributes{{"name", segment.name}};
+    if (!segment.parent.empty())
+      attributes.emplace_back("parent", segment.parent);
+    xml.Add("Segment", attributes);
+  }
+  xml.Close();
+}
+
 }

@@ -1,6 +1,7 @@
 #pragma once
 
 #include "StandaloneHost/Files/ElementReader.h"
+#include "StandaloneHost/Files/ElementWriter.h"
 
 #include <string>
 #include <vector>
@@ -20,5 +21,8 @@ struct Segment
 /// Reads the segments that `list` consists of, which is the element that was entered last: 1 to 256, the root first,
 /// no two with the same name. [any]
 [[nodiscard]] std::vector<Segment> ReadSegments(ElementReader& xml, const Element& list);
+
+/// Writes the element "Segments" from which ReadSegments reads these.
+void WriteSegments(ElementWriter& xml, const std::vector<Segment>& segments);
 
 }

@@ -14,17 +14,25 @@ namespace Files
 namespace
 {
 
-/// How many bytes the file has, when it is one that can be read at all.
-std::size_t CheckedSize(const std::filesystem::path& file, std::size_t maximumBytes)
+/// Anything but a regular file could keep the host waiting for ever.
+void CheckIsRegular(const std::filesystem::path& file)
 {
   std::error_code error;
   const auto status = std::filesystem::status(file, error);
   if (error)
-    FailUnreadable(file, "the file cannot be read: " + error.message());
-  // Anything else could keep the host waiting for ever.
+    FailUnreadable(file, "the file cannot be read: " + error.message(),
+                   status.type() == std::filesystem::file_type::not_found ? NMX::EResult::FileNotFound
+                                                                          : NMX::EResult::FileIOFailure);
   if (!std::filesystem::is_regular_file(status))
     FailUnreadable(file, std::filesystem::is_directory(status) ? "this is a directory, expected a file"
                                                                : "this is a device or a pipe, expected a file");
+}
+
+/// How many bytes the file has, when it is one that can be read at all.
+std::size_t CheckedSize(const std::filesystem::path& file, std::size_t maximumBytes)
+{
+  CheckIsRegular(file);
+  std::error_code error;
   const auto size = std::filesystem::file_size(file, error);
   if (error)
     FailUnreadable(file, "the file cannot be read: " + error.message());
@@ -86,6 +94,14 @@ std::string ReadTextFile(const std::filesystem::path& file, std::size_t maximumB
     Fail({&file}, "the file is empty, expected XML");
   CheckText(file, text);
   return text;
+}
+
+void CheckReadable(const std::filesystem::path& file)
+{
+  CheckIsRegular(file);
+  errno = 0;
+  if (!std::ifstream(file, std::ios::binary))
+    FailUnreadable(file, "the file cannot be read: " + std::generic_category().message(errno));
 }
 
 }

@@ -15,4 +15,7 @@ inline constexpr std::size_t maximumFileBytes = std::size_t{64} << 20;
 /// tag that is too long. Of a file that is too large, nothing is read.
 [[nodiscard]] std::string ReadTextFile(const std::filesystem::path& file, std::size_t maximumBytes = maximumFileBytes);
 
+/// Throws UnreadableFileError unless there is a regular file that can be opened.
+void CheckReadable(const std::filesystem::path& file);
+
 }

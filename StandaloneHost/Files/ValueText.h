@@ -18,7 +18,10 @@ namespace Files
 [[nodiscard]] NMX::Value ReadValue(NMX::EValueType type, const Place& place, std::string_view what,
                                    std::string_view text);
 
-/// The same, for a type that is known beforehand.
+/// The text from which ReadValue reads the value again; its type has one.
+[[nodiscard]] std::string TextOf(const NMX::Value& value);
+
+/// As ReadValue, for a type that is known beforehand.
 template <class T>
 [[nodiscard]] T ReadAs(const Place& place, std::string_view what, std::string_view text)
 {

@@ -15,7 +15,7 @@ namespace
 {
 
 constexpr std::string_view devices = "Application/Devices/";
-constexpr std::string_view typeEnd = "/Type";
+constexpr std::string_view rebooting = "Rebooting"; // there while it is
 constexpr std::size_t maximumUrnBytes = 255;
 constexpr std::uint32_t fullBattery = 100;
 
@@ -55,14 +55,25 @@ Devices::Devices(std::shared_ptr<NMX::IStore> store) : m_store(std::move(store))
 
 std::set<std::string> Devices::Urns() const
 {
+  return UrnsWith("Type");
+}
+
+std::set<std::string> Devices::Rebooting() const
+{
+  return UrnsWith(rebooting);
+}
+
+std::set<std::string> Devices::UrnsWith(std::string_view entry) const
+{
   std::set<std::string> urns;
+  const std::string end = '/' + std::string(entry);
   const auto reader = m_store->Reader();
   for (const NMX::EntryPath path : reader->ApplicationEntries(NMX::Paths::PathConstant<"Application/Devices">()))
   {
     std::string_view text = path.Text();
     text.remove_prefix(std::min(devices.size(), text.size()));
-    if (text.ends_with(typeEnd))
-      urns.emplace(text.substr(0, text.size() - typeEnd.size()));
+    if (text.ends_with(end))
+      urns.emplace(text.substr(0, text.size() - end.size()));
   }
   return urns;
 }
@@ -125,6 +136,36 @@ IResult Devices::SetBattery(const std::string& urn, std::uint32_t percent)
 IResult Devices::SetRadio(const std::string& urn, std::uint32_t radio)
 {
   return Set(urn, "Radio", radio);
+}
+
+IResult Devices::BeginReboot(const std::string& urn)
+{
+  const auto editor = m_store->Editor();
+  if (!Exists(*editor, urn))
+    return EResult::NotFound;
+  bool connected = false;
+  Take(Find(*editor, urn, "Connected"), connected);
+  if (!connected)
+    return EResult::NotConnected;
+  const std::pair<std::string_view, bool> entries[] = {{"Connected", false}, {rebooting, true}};
+  for (const auto& [entry, value] : entries)
+    if (const IResult set = editor->SetApplicationEntry(NMX::EntryPath(PathText(urn, entry)), value); set.Failed())
+      return set;
+  return editor->Commit();
+}
+
+IResult Devices::EndReboot(const std::string& urn)
+{
+  const auto editor = m_store->Editor();
+  if (!Exists(*editor, urn))
+    return EResult::NotFound;
+  if (Find(*editor, urn, rebooting) == nullptr)
+    return EResult::OkButNoEffect;
+  if (const IResult set = editor->SetApplicationEntry(NMX::EntryPath(PathText(urn, rebooting)), {}); set.Failed())
+    return set;
+  if (const IResult set = editor->SetApplicationEntry(NMX::EntryPath(PathText(urn, "Connected")), true); set.Failed())
+    return set;
+  return editor->Commit();
 }
 
 IResult Devices::Set(const std::string& urn, std::string_view entry, NMX::Value value)

@@ -42,8 +42,16 @@ public:
   NMX::IResult SetBattery(const std::string& urn, std::uint32_t percent);
   NMX::IResult SetRadio(const std::string& urn, std::uint32_t radio);
 
+  /// Disconnects a device and notes that it is rebooting, so that it is known even to the next program. `NotConnected`
+  /// when it is not connected.
+  NMX::IResult BeginReboot(const std::string& urn);
+  /// Connects a device that is rebooting; without effect on any other.
+  NMX::IResult EndReboot(const std::string& urn);
+  [[nodiscard]] std::set<std::string> Rebooting() const;
+
 private:
   NMX::IResult Set(const std::string& urn, std::string_view entry, NMX::Value value);
+  [[nodiscard]] std::set<std::string> UrnsWith(std::string_view entry) const;
 
   const std::shared_ptr<NMX::IStore> m_store;
 };

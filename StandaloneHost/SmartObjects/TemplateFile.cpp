@@ -2,6 +2,7 @@
 
 #include "StandaloneHost/Files/ElementParts.h"
 #include "StandaloneHost/Files/ElementReader.h"
+#include "StandaloneHost/Files/ElementWriter.h"
 
 namespace SmartObjects
 {
@@ -45,6 +46,17 @@ SmartObjectTemplate ReadTemplate(const std::filesystem::path& file)
                         [&](const Element& /*section*/) { content.additionalMarkers = Files::ReadMarkers(xml); }}});
   xml.End();
   return content;
+}
+
+std::string TemplateText(const SmartObjectTemplate& content)
+{
+  Files::ElementWriter xml("SmartObjectTemplate");
+  xml.Open("SmartClusters");
+  for (const ClusterTemplate& cluster : content.clusters)
+    xml.Add("SmartCluster", {{"label", cluster.label}, {"type", cluster.type}});
+  xml.Close();
+  Files::WriteMarkers(xml, "AdditionalMarkerPositions", content.additionalMarkers);
+  return xml.Finish();
 }
 
 }

@@ -31,4 +31,8 @@ struct SmartObjectTemplate
 /// Reads a template file. Throws Files::ConfigurationError when anything is wrong with it. [any]
 [[nodiscard]] SmartObjectTemplate ReadTemplate(const std::filesystem::path& file);
 
+/// The text of a file from which ReadTemplate reads the same, if it can be read at all. Throws
+/// Files::ConfigurationError for a text that no file can hold. [any]
+[[nodiscard]] std::string TemplateText(const SmartObjectTemplate& content);
+
 }
