@@ -42,6 +42,9 @@ public:
   /// 1 while it looks for the T-pose, 2 and 3 while it calibrates; anything else: nothing runs.
   [[nodiscard]] virtual std::uint32_t Phase() const = 0;
 
+  /// The session of the run, or of the last one; 0 when there has been none.
+  [[nodiscard]] virtual NMX::TCalibrationSessionId Session() const = 0;
+
   /// How the last run ended: `NotSet` when there has been none, `Canceled` when it was cancelled.
   [[nodiscard]] virtual NMX::IResult LastResult() const = 0;
 

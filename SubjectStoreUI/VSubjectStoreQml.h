@@ -24,6 +24,7 @@ class IObjectPresetProvider;
 namespace SubjectStoreUI
 {
 
+struct PanelBackend;
 class VCalibrationScalingQml;
 
 /// The panel's way into the subject store: what QML calls "SubjectStore". Subjects are named by their ids
@@ -53,7 +54,7 @@ class VSubjectStoreQml : public QObject
 
 public:
   /// What a file is of.
-  enum ESubjectFileType
+  enum ESubjectFileType : int // QML may hand in any number
   {
     ESubjectTemplate,
     ESmartObjectTemplate,
@@ -179,6 +180,8 @@ Q_SIGNALS:
   void focusSubject(const SubjectStoreUI::VStoreIdGadget& subjectStoreId);
 
 private:
+  [[nodiscard]] const PanelBackend& Backend() const;
+
   struct Implementation;
   const std::unique_ptr<Implementation> m_implementation;
 };

@@ -14,6 +14,7 @@ struct WarningType
   /// The sentence that counts the subjects: %1 is the count, %2 the ending of the verb. Empty for what the panel does
   /// not count.
   std::string_view sentence;
+  std::string_view ofOne; ///< the sentence about one subject that has it
 };
 
 /// Every warning type at the index that is its type id. Index 0 is the group "Warnings" itself, under which the store

@@ -19,9 +19,13 @@ namespace Feature
 inline constexpr std::uint32_t basicObjects = 1U << 0;
 inline constexpr std::uint32_t smartObjects = 1U << 1;
 inline constexpr std::uint32_t characters = 1U << 2;
+inline constexpr std::uint32_t generalSubjects = 1U << 3;
+inline constexpr std::uint32_t props = 1U << 4;
+inline constexpr std::uint32_t labellingClusters = 1U << 5;
 inline constexpr std::uint32_t objectPresets = 1U << 6;
 inline constexpr std::uint32_t proximityGrouping = 1U << 8;
 inline constexpr std::uint32_t objectEvaluation = 1U << 9;
+inline constexpr std::uint32_t sceneMeshes = 1U << 12;
 inline constexpr std::uint32_t markerless = 1U << 14;
 inline constexpr std::uint32_t objectAutoAssign = 1U << 15;
 }

@@ -284,6 +284,11 @@ IResult VSubjectCalibrationController::Advance(const boost::asio::steady_timer* 
   return ended;
 }
 
+NMX::TCalibrationSessionId VSubjectCalibrationController::Session() const
+{
+  return Current().run.session;
+}
+
 std::uint32_t VSubjectCalibrationController::Phase() const
 {
   return Current().phase;

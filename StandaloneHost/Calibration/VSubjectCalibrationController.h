@@ -49,6 +49,7 @@ public:
   bool CanPerform(ECalibrationAction action, std::string& reason) const override;
   NMX::IResult Perform(ECalibrationAction action, NMX::TCalibrationSessionId& session) override;
   [[nodiscard]] std::uint32_t Phase() const override;
+  [[nodiscard]] NMX::TCalibrationSessionId Session() const override;
   [[nodiscard]] NMX::IResult LastResult() const override;
   void SetFreshCalibration(bool fresh) override;
 

@@ -35,8 +35,9 @@ public:
   MOCK_METHOD(IResult, SetTargetSubject, (Subject), (override));
   MOCK_METHOD(IResult, SetTargetSubjects, (const std::set<Subject>&), (override));
   MOCK_METHOD(bool, CanPerform, (ECalibrationAction, std::string&), (const, override));
-  MOCK_METHOD(IResult, Perform, (ECalibrationAction, Session&), (override));
+  MOCK_METHOD(IResult, Perform, (ECalibrationAction, NMX::TCalibrationSessionId&), (override));
   MOCK_METHOD(std::uint32_t, Phase, (), (const, override));
+  MOCK_METHOD(NMX::TCalibrationSessionId, Session, (), (const, override));
   MOCK_METHOD(IResult, LastResult, (), (const, override));
   MOCK_METHOD(void, SetFreshCalibration, (bool), (override));
 };

@@ -273,6 +273,7 @@ TEST_F(SubjectModelsTest, TheTreeShowsChildrenBeneathTheSubjectsOfItsKind)
   tree->refresh();
   shadow.Check();
   EXPECT_EQ(shadow.removals, 1);
+  EXPECT_THAT(Sentences(), testing::Not(testing::Contains(testing::HasSubstr("be confused"))));
 }
 
 TEST_F(SubjectModelsTest, ANewSubjectArrivesBeforeItsChildrenWhichArriveTogether)

@@ -1,0 +1,462 @@
+#include "SubjectStoreUI/VSubjectPanelQml.h"
+
+#include "HostInterface/ICharacterControls.h"
+#include "HostInterface/ISmartObjectControls.h"
+#include "HostInterface/RunaCorePluginInterface/ICalibrationProvider.h"
+#include "HostInterface/RunaCorePluginInterface/IObjectEvaluationSettings.h"
+#include "HostInterface/RunaCorePluginInterface/IObjectPresetProvider.h"
+#include "RunaCorePluginSubjectStore/Subjects/NameCheck.h"
+#include "RunaCorePluginSubjectStore/Subjects/SlotAssignment.h"
+#include "StoreInterface/ColourText.h"
+#include "StoreInterface/EntryPaths.h"
+#include "SubjectStoreUI/PanelBackend.h"
+#include "SubjectStoreUI/StoreWatch.h"
+#include "SubjectStoreUI/VDeviceModel.h"
+#include "SubjectStoreUI/VPanelRowsModel.h"
+#include "SubjectStoreUI/WarningGadget.h"
+#include "SubjectStoreUI/WarningTypes.h"
+
+#include <algorithm>
+#include <set>
+#include <utility>
+
+namespace SubjectStoreUI
+{
+
+using NMX::EResult;
+using NMX::ESubjectKind;
+using NMX::IResult;
+using NMX::TSubjectStoreId;
+using RunaCorePluginInterface::IPanelServices;
+namespace Paths = NMX::Paths;
+
+namespace
+{
+
+constexpr int watchIntervalInMilliseconds = 50;
+constexpr qsizetype maximumNameBytes = 255;
+
+using Clusters = std::vector<NMX::SmartCluster>;
+
+QList<VSortSubjectsProxyModel*> ToSections(const QObjectList& objects)
+{
+  QList<VSortSubjectsProxyModel*> sections;
+  for (QObject* object : objects)
+    if (auto* section = qobject_cast<VSortSubjectsProxyModel*>(object))
+      sections.append(section);
+  return sections;
+}
+
+/// All objects, basic and smart.
+std::vector<TSubjectStoreId> Objects(const NMX::IStoreReader& access)
+{
+  std::vector<TSubjectStoreId> objects;
+  for (const ESubjectKind kind : {ESubjectKind::BasicObjects, ESubjectKind::SmartObjects})
+  {
+    std::vector<TSubjectStoreId> ofKind;
+    (void)access.Subjects(kind, ofKind);
+    objects.insert(objects.end(), ofKind.begin(), ofKind.end());
+  }
+  return objects;
+}
+
+QString NameOf(const NMX::IStoreReader& access, TSubjectStoreId subject)
+{
+  std::string name;
+  (void)NMX::Read(access, subject, Paths::Name(), name);
+  return QString::fromStdString(name);
+}
+
+/// Sorts maps by the text that they have for a key.
+void SortBy(QVariantList& maps, const QString& key)
+{
+  std::sort(maps.begin(), maps.end(), [&](const QVariant& a, const QVariant& b)
+            { return a.toMap()[key].toString().compare(b.toMap()[key].toString(), Qt::CaseInsensitive) < 0; });
+}
+
+void AppendMarkers(QVariantList& places, const std::vector<NMX::Position>& markers)
+{
+  for (const NMX::Position& marker : markers)
+    places.append(QVariantMap{{"x", marker.x}, {"y", marker.y}, {"z", marker.z}, {"pattern", 0}});
+}
+
+}
+
+struct VSubjectPanelQml::Implementation
+{
+  Implementation(const PanelBackend& panelBackend, const QObjectList& sections)
+      : backend(panelBackend), watch(*backend.store, backend.gui, watchIntervalInMilliseconds),
+        rows(ToSections(sections)), devices(backend, watch)
+  {
+    std::shared_ptr<RunaCorePluginInterface::ICalibrationProvider> provider;
+    if (provider = backend.Get(&IPanelServices::CalibrationProvider); provider)
+      calibration = std::make_unique<VSubjectCalibrationQml>(backend, *provider);
+    if (backend.Get(&IPanelServices::ObjectEvaluationSettings))
+      evaluation = std::make_unique<VObjectEvaluationQml>(backend);
+  }
+
+  [[nodiscard]] VResultGadget SetText(const QVariantList& subjects, NMX::EntryPath path, const QString& text) const
+  {
+    return backend.EditEach(ToIds(subjects), [&](NMX::IEntryEditor& editor, TSubjectStoreId id)
+                            { return editor.SetValue(id, path, text.toStdString(), NMX::ENotify::Yes); });
+  }
+
+  /// The texts that objects have for an entry.
+  [[nodiscard]] QStringList Texts(NMX::EntryPath path) const
+  {
+    std::set<QString> texts;
+    const auto access = backend.store->Reader();
+    for (const TSubjectStoreId id : Objects(*access))
+      if (std::string text; NMX::Read(*access, id, path, text).Succeeded() && !text.empty())
+        texts.insert(QString::fromStdString(text));
+    return {texts.begin(), texts.end()};
+  }
+
+  /// Edits one cluster: `edit(editor, cluster)`. `InvalidIndex` when it is not there.
+  template <class Edit>
+  [[nodiscard]] VResultGadget EditCluster(TSubjectStoreId object, int index, Edit edit) const
+  {
+    return backend.Edit(
+        [&](NMX::IEntryEditor& editor) -> IResult
+        {
+          Clusters clusters;
+          if (const IResult read = NMX::Read(editor, object, Paths::SmartClusters(), clusters); read.Failed())
+            return read;
+          const auto position = static_cast<std::size_t>(index); // of a negative index far past the end
+          if (position >= clusters.size())
+            return EResult::InvalidIndex;
+          if (const IResult edited = edit(editor, clusters[position]); edited.Failed())
+            return edited;
+          return editor.SetValue(object, Paths::SmartClusters(), std::move(clusters), NMX::ENotify::Yes);
+        });
+  }
+
+  const PanelBackend& backend;
+  StoreWatch watch;
+  VPanelRowsModel rows;
+  VDeviceModel devices;
+  std::unique_ptr<VSubjectCalibrationQml> calibration;
+  std::unique_ptr<VObjectEvaluationQml> evaluation;
+  std::shared_ptr<RunaCorePluginInterface::IObjectPresetProvider> presetProvider;
+  NMX::Subscription selectionChanges;
+};
+
+VSubjectPanelQml::VSubjectPanelQml(const PanelBackend& backend, const QObjectList& sections)
+    : m_implementation(std::make_unique<Implementation>(backend, sections))
+{
+  connect(&m_implementation->watch, &StoreWatch::changed, this, &VSubjectPanelQml::revisionChanged);
+  if (backend.selection)
+    m_implementation->selectionChanges = backend.selection->OnChange([this] { Q_EMIT selectionChanged(); });
+}
+
+VSubjectPanelQml::~VSubjectPanelQml() = default;
+
+void VSubjectPanelQml::SetObjectPresetProvider(std::shared_ptr<RunaCorePluginInterface::IObjectPresetProvider> provider)
+{
+  m_implementation->presetProvider = std::move(provider);
+}
+
+QVariantList VSubjectPanelQml::selection() const
+{
+  const auto& manager = m_implementation->backend.selection;
+  return manager ? FromItems(manager->Selection()) : QVariantList{};
+}
+
+QVariantList VSubjectPanelQml::selectedSubjects() const
+{
+  return FromIds(m_implementation->backend.SelectedSubjects());
+}
+
+QAbstractItemModel* VSubjectPanelQml::rows() const
+{
+  return &m_implementation->rows;
+}
+
+QAbstractItemModel* VSubjectPanelQml::devices() const
+{
+  return &m_implementation->devices;
+}
+
+VSubjectCalibrationQml* VSubjectPanelQml::calibration() const
+{
+  return m_implementation->calibration.get();
+}
+
+VObjectEvaluationQml* VSubjectPanelQml::evaluation() const
+{
+  return m_implementation->evaluation.get();
+}
+
+int VSubjectPanelQml::revision() const
+{
+  return m_implementation->watch.Revision();
+}
+
+bool VSubjectPanelQml::autoPatternManagement() const
+{
+  const auto access = m_implementation->backend.store->Reader();
+  const NMX::Value* value = access->FindApplicationEntry(Paths::AutoPatternManagement());
+  const bool* on = value != nullptr ? std::get_if<bool>(value) : nullptr;
+  return on != nullptr && *on;
+}
+
+void VSubjectPanelQml::select(const QVariantList& items)
+{
+  if (m_implementation->backend.selection)
+    m_implementation->backend.selection->Select(ToItems(items));
+}
+
+VSelectionItemGadget VSubjectPanelQml::itemOf(const VStoreIdGadget& subject) const
+{
+  return VSelectionItemGadget(subject.Id());
+}
+
+VSelectionItemGadget VSubjectPanelQml::itemOfDevice(const QString& urn) const
+{
+  return VSelectionItemGadget(SelectionItem{{}, -1, urn.toStdString()});
+}
+
+QString VSubjectPanelQml::nameProblem(const QString& name, const VStoreIdGadget& subject) const
+{
+  const std::string text = name.toStdString();
+  if (text.empty())
+    return tr("A name is needed.");
+  if (static_cast<qsizetype>(text.size()) > maximumNameBytes)
+    return tr("The name is too long.");
+  const auto access = m_implementation->backend.store->Reader();
+  TSubjectStoreId known;
+  if (access->FindByName(text, known).Succeeded())
+    return known == subject.Id() ? QString() : tr("A subject of that name exists already.");
+  if (text.front() == ' ' || text.back() == ' ')
+    return tr("A name cannot begin or end with a space.");
+  if (Subjects::MatchesPattern(text, access->NamePattern()))
+    return {};
+  for (const QChar character : name)
+    if (QString(R"(/\:*?"<>|)").contains(character))
+      return tr("A name cannot contain \"%1\".").arg(character);
+  return tr("That name is not allowed.");
+}
+
+QString VSubjectPanelQml::colour(const VStoreIdGadget& subject) const
+{
+  const auto colour = m_implementation->backend.Entry<NMX::Colour>(subject.Id(), Paths::ColourRGBA());
+  return colour ? QString::fromStdString(NMX::ColourToText(*colour)) : QString();
+}
+
+VResultGadget VSubjectPanelQml::setColour(const QVariantList& subjects, const QString& colour)
+{
+  NMX::Colour value;
+  if (NMX::ColourFromText(colour.toStdString(), value).Failed())
+    return {EResult::InvalidValue, "\"" + colour.toStdString() + "\" is not a colour."};
+  return m_implementation->backend.EditEach(ToIds(subjects), [&](NMX::IEntryEditor& editor, TSubjectStoreId id)
+                                            { return editor.SetValue(id, Paths::ColourRGBA(), value); });
+}
+
+QString VSubjectPanelQml::proximityGroup(const VStoreIdGadget& subject) const
+{
+  return QString::fromStdString(
+      m_implementation->backend.Entry<std::string>(subject.Id(), Paths::ProximityGroupName()).value_or(""));
+}
+
+VResultGadget VSubjectPanelQml::setProximityGroup(const QVariantList& subjects, const QString& name)
+{
+  return m_implementation->SetText(subjects, Paths::ProximityGroupName(), name);
+}
+
+QString VSubjectPanelQml::templateGroup(const VStoreIdGadget& subject) const
+{
+  return QString::fromStdString(
+      m_implementation->backend.Entry<std::string>(subject.Id(), Paths::TemplateGroupName()).value_or(""));
+}
+
+VResultGadget VSubjectPanelQml::setTemplateGroup(const QVariantList& subjects, const QString& name)
+{
+  return m_implementation->SetText(subjects, Paths::TemplateGroupName(), name);
+}
+
+QStringList VSubjectPanelQml::proximityGroups() const
+{
+  return m_implementation->Texts(Paths::ProximityGroupName());
+}
+
+QStringList VSubjectPanelQml::templateGroups() const
+{
+  return m_implementation->Texts(Paths::TemplateGroupName());
+}
+
+VResultGadget VSubjectPanelQml::setAutoAssign(const QVariantList& subjects, bool on)
+{
+  return m_implementation->backend.EditEach(ToIds(subjects), [&](NMX::IEntryEditor& editor, TSubjectStoreId id)
+                                            { return editor.SetValue(id, Paths::AutoAssignEnabled(), on); });
+}
+
+VResultGadget VSubjectPanelQml::applyPreset(const VStoreIdGadget& preset, const QVariantList& subjects)
+{
+  const auto& provider = m_implementation->presetProvider;
+  if (!provider)
+    return IResult(EResult::NotAvailable);
+  return m_implementation->backend.EditEach(ToIds(subjects), [&](NMX::IEntryEditor& editor, TSubjectStoreId id)
+                                            { return provider->Apply(editor, preset.Id(), id); });
+}
+
+VResultGadget VSubjectPanelQml::addBasicObject(const QString& name)
+{
+  TSubjectStoreId added;
+  const VResultGadget result = m_implementation->backend.Edit(
+      [&](NMX::IEntryEditor& editor) { return editor.Add(ESubjectKind::BasicObjects, name.toStdString(), added); });
+  if (!result.Failed())
+    Q_EMIT subjectAdded(VStoreIdGadget(added));
+  return result;
+}
+
+VResultGadget VSubjectPanelQml::addSmartObject(const QString& name, const QUrl& file)
+{
+  const auto controls = m_implementation->backend.Get(&IPanelServices::SmartObjectControls);
+  if (!controls)
+    return IResult(EResult::NotAvailable);
+  if (!file.isLocalFile())
+    return {EResult::InvalidName, "A template has to be chosen."};
+  const IResult created = controls->CreateFromTemplate(name.toStdString(), file.toLocalFile().toStdString(),
+                                                       ISmartObjectControls::ECreate::Yes);
+  if (created == EResult::Failed)
+    return {created, "The template cannot be used; the log says where and why."};
+  TSubjectStoreId added;
+  if (created.Succeeded() &&
+      m_implementation->backend.store->Reader()->FindByName(name.toStdString(), added).Succeeded())
+    Q_EMIT subjectAdded(VStoreIdGadget(added));
+  return created;
+}
+
+VResultGadget VSubjectPanelQml::addCharacter(const QString& name, const QUrl& file)
+{
+  const auto controls = m_implementation->backend.Get(&IPanelServices::CharacterControls);
+  if (!controls)
+    return IResult(EResult::NotAvailable);
+  if (!file.isLocalFile())
+    return {EResult::InvalidName, "A template has to be chosen."};
+  TSubjectStoreId added;
+  const VResultGadget result = m_implementation->backend.Edit(
+      [&](NMX::IEntryEditor& editor)
+      {
+        const IResult created =
+            controls->CreateFromTemplate(editor, name.toStdString(), file.toLocalFile().toStdString());
+        return created.Failed() ? created : editor.FindByName(name.toStdString(), added);
+      });
+  if (!result.Failed())
+    Q_EMIT subjectAdded(VStoreIdGadget(added));
+  return result;
+}
+
+VResultGadget VSubjectPanelQml::setClusterPattern(const VStoreIdGadget& subject, int cluster, int pattern)
+{
+  const auto controls = m_implementation->backend.Get(&IPanelServices::SmartObjectControls);
+  if (!controls)
+    return IResult(EResult::NotAvailable);
+  const VResultGadget set =
+      m_implementation->EditCluster(subject.Id(), cluster,
+                                    [&](const NMX::IEntryEditor& editor, NMX::SmartCluster& edited)
+                                    {
+                                      edited.pattern =
+                                          static_cast<std::uint32_t>(pattern); // a negative one is far too great
+                                      return controls->CheckPattern(editor, edited.type, edited.pattern);
+                                    });
+  if (set.Result() == EResult::InvalidValue)
+    return {EResult::InvalidValue, "Pattern " + std::to_string(pattern) + " is not in use at present."};
+  return set;
+}
+
+VResultGadget VSubjectPanelQml::setClusterDevice(const VStoreIdGadget& subject, int cluster, const QString& urn)
+{
+  return m_implementation->EditCluster(subject.Id(), cluster,
+                                       [&](const NMX::IEntryEditor&, NMX::SmartCluster& edited) -> IResult
+                                       {
+                                         edited.deviceUrn = urn.toStdString();
+                                         return EResult::Ok;
+                                       });
+}
+
+VResultGadget VSubjectPanelQml::setAutoPatternManagement(bool on)
+{
+  return m_implementation->backend.Edit([&](NMX::IEntryEditor& editor)
+                                        { return editor.SetApplicationEntry(Paths::AutoPatternManagement(), on); });
+}
+
+QVariantList VSubjectPanelQml::candidatesFor(const VSelectionItemGadget& slot) const
+{
+  const auto access = m_implementation->backend.store->Reader();
+  QVariantList candidates;
+  for (const TSubjectStoreId object : Subjects::UnassignedObjects(*access))
+    if (Subjects::CheckAssign(*access, object, slot.Item().subject, static_cast<std::uint32_t>(slot.Slot()))
+            .Succeeded())
+      candidates.append(
+          QVariantMap{{"id", QVariant::fromValue(VStoreIdGadget(object))}, {"name", NameOf(*access, object)}});
+  SortBy(candidates, "name");
+  return candidates;
+}
+
+QVariantList VSubjectPanelQml::slotsFor(const VStoreIdGadget& subject) const
+{
+  const auto access = m_implementation->backend.store->Reader();
+  QVariantList places;
+  for (const Subjects::EmptySlot& slot : Subjects::EmptySlots(*access))
+    if (Subjects::CheckAssign(*access, subject.Id(), slot.character, slot.index).Succeeded())
+    {
+      const VSelectionItemGadget item(slot.character, static_cast<int>(slot.index));
+      places.append(
+          QVariantMap{{"item", QVariant::fromValue(item)},
+                      {"name", NameOf(*access, slot.character) + " / " + QString::fromStdString(slot.slot.name)}});
+    }
+  return places;
+}
+
+QVariantList VSubjectPanelQml::markers(const VStoreIdGadget& subject) const
+{
+  using Positions = std::vector<NMX::Position>;
+  const PanelBackend& backend = m_implementation->backend;
+  QVariantList places;
+  for (const NMX::EntryPath path : {Paths::Markers(), Paths::AdditionalMarkerPositions()})
+    AppendMarkers(places, backend.Entry<Positions>(subject.Id(), path).value_or(Positions{}));
+  return places;
+}
+
+QVariantList VSubjectPanelQml::confusableWith(const VStoreIdGadget& subject) const
+{
+  const auto evaluation = m_implementation->backend.Get(&IPanelServices::ObjectEvaluationSettings);
+  QVariantList found;
+  if (!evaluation)
+    return found;
+  const auto access = m_implementation->backend.store->Reader();
+  for (const TSubjectStoreId other : Objects(*access))
+  {
+    bool matches = false;
+    double distance = 0;
+    if (evaluation->MatchDistance(*access, subject.Id(), other, matches, distance).Succeeded() && matches)
+      found.append(QVariantMap{{"id", QVariant::fromValue(VStoreIdGadget(other))},
+                               {"name", NameOf(*access, other)},
+                               {"distance", distance}});
+  }
+  std::stable_sort(found.begin(), found.end(), [](const QVariant& a, const QVariant& b)
+                   { return a.toMap()["distance"].toDouble() < b.toMap()["distance"].toDouble(); });
+  return found;
+}
+
+QVariantList VSubjectPanelQml::warningsOf(const VStoreIdGadget& subject) const
+{
+  QVariantList warnings;
+  const auto access = m_implementation->backend.store->Reader();
+  const auto types = WarningTypes();
+  for (std::size_t type = 1; type < types.size(); ++type)
+  {
+    const NMX::Value* value = nullptr;
+    (void)access->Find(subject.Id(), NMX::EntryPath("Warnings/" + std::string(types[type].key)), value);
+    const bool* holds = value != nullptr ? std::get_if<bool>(value) : nullptr;
+    if (holds == nullptr || !*holds)
+      continue;
+    const std::string_view text = types[type].ofOne;
+    warnings.append(QVariant::fromValue(
+        VWarningGadget{static_cast<int>(type), QString::fromUtf8(text.data(), static_cast<qsizetype>(text.size()))}));
+  }
+  return warnings;
+}
+
+}

@@ -1,0 +1,513 @@
+#include "SubjectStoreUI/VSubjectStoreQml.h"
+
+#include "HostInterface/ICharacterControls.h"
+#include "HostInterface/IDeviceServices.h"
+#include "HostInterface/ISmartObjectControls.h"
+#include "HostInterface/RunaCorePluginInterface/IObjectEvaluationSettings.h"
+#include "HostInterface/RunaCorePluginInterface/IPluginSettings.h"
+#include "RunaCorePluginSubjectStore/Subjects/ClusterEdits.h"
+#include "RunaCorePluginSubjectStore/Subjects/SlotAssignment.h"
+#include "StoreInterface/EntryPaths.h"
+#include "SubjectStoreUI/ObjectEvaluationWatch.h"
+#include "SubjectStoreUI/PanelBackend.h"
+#include "SubjectStoreUI/PanelParameters.h"
+#include "SubjectStoreUI/SubjectSection.h"
+#include "SubjectStoreUI/VCalibrationScalingQml.h"
+#include "SubjectStoreUI/VStoreObjectPresetModel.h"
+#include "SubjectStoreUI/VSubjectListModelStore.h"
+#include "SubjectStoreUI/VSubjectModelInternalData.h"
+#include "SubjectStoreUI/VSubjectPanelQml.h"
+
+#include <QQmlContext>
+#include <QQmlEngine>
+
+#include <algorithm>
+#include <utility>
+
+namespace SubjectStoreUI
+{
+
+using NMX::EResult;
+using NMX::ESubjectKind;
+using NMX::IResult;
+using NMX::TSubjectStoreId;
+using RunaCorePluginInterface::IPanelServices;
+namespace Feature = RunaCorePluginInterface::Feature;
+namespace Paths = NMX::Paths;
+
+namespace
+{
+
+using Clusters = std::vector<NMX::SmartCluster>;
+
+/// How long changes are gathered before the models show them.
+constexpr int batchingIntervalInMilliseconds = 100;
+
+/// The kinds that have sections, each with the features of which one must be on, in the order of the sections.
+constexpr std::pair<ESubjectKind, std::uint32_t> sectionFeatures[] = {
+    {ESubjectKind::CharactersFromClusters, Feature::characters},
+    {ESubjectKind::GeneralSubjects, Feature::generalSubjects},
+    {ESubjectKind::SmartObjects, Feature::smartObjects},
+    {ESubjectKind::BasicObjects, Feature::basicObjects},
+    {ESubjectKind::LabellingClusters, Feature::labellingClusters},
+    {ESubjectKind::Markerless, Feature::markerless},
+    {ESubjectKind::Props, Feature::props},
+    {ESubjectKind::SceneMeshes, Feature::sceneMeshes},
+};
+
+}
+
+struct VSubjectStoreQml::Implementation
+{
+  Implementation(VSubjectStoreQml& owner, PanelBackend panelBackend)
+      : backend(std::move(panelBackend)), data(std::make_shared<VSubjectModelInternalData>(backend.store, backend.gui)),
+        allSubjects(NMX::MakeShared<VSubjectListModelStore>(data, &warnings)), evaluation(backend),
+        setup(backend.store, backend.gui, SetupParameters()), selected(backend.store, backend.gui, SubjectParameters())
+  {
+    allSubjects->followStore(batchingIntervalInMilliseconds);
+    QObject::connect(&warnings, &VSubjectWarningSummary::subjectWarningsChanged, &owner,
+                     &VSubjectStoreQml::subjectWarningsChanged);
+    QObject::connect(&evaluation, &ObjectEvaluationWatch::changed, &owner,
+                     &VSubjectStoreQml::objectEvaluationProgressChanged);
+    for (const auto& [kind, features] : sectionFeatures)
+      if ((Features() & features) != 0)
+        sections.push_back(std::make_unique<SubjectSection>(data, kind, batchingIntervalInMilliseconds));
+    if ((Features() & Feature::objectPresets) != 0)
+      presets =
+          NMX::MakeShared<VStoreObjectPresetModel>(backend.store, backend.gui, [this] { return FirstSelected(); });
+    selected.ShowSubject(FirstSelected());
+    if (backend.selection)
+      selectionChanges = backend.selection->OnChange([this] { selected.ShowSubject(FirstSelected()); });
+  }
+
+  [[nodiscard]] std::uint32_t Features() const
+  {
+    const auto features = backend.Get(&IPanelServices::Features);
+    return features ? features->Mask() : 0;
+  }
+
+  [[nodiscard]] TSubjectStoreId FirstSelected() const
+  {
+    const auto subjects = backend.SelectedSubjects();
+    return subjects.empty() ? TSubjectStoreId{} : subjects.front();
+  }
+
+  /// Whether a rule of an operation is kept at present.
+  template <class Check>
+  [[nodiscard]] bool Can(Check check) const
+  {
+    return Subjects::Guarded([&]() -> IResult { return check(*backend.store->Reader()); }).Succeeded();
+  }
+
+  [[nodiscard]] VResultGadget SetModelOutput(const QString& name, bool on)
+  {
+    const NMX::EntryPath path = name == "CGM2" ? Paths::ModelOutputCGM2() : Paths::ModelOutputPluginKinex();
+    if (name != "CGM2" && name != "PluginKinex")
+      return {EResult::NotFound, "There is no model \"" + name.toStdString() + "\"."};
+    return backend.EditEach(backend.SelectedSubjects(), [&](NMX::IEntryEditor& editor, TSubjectStoreId id)
+                            { return editor.SetValue(id, path, on); });
+  }
+
+  const PanelBackend backend;
+  const std::shared_ptr<VSubjectModelInternalData> data;
+  VSubjectWarningSummary warnings;
+  const std::shared_ptr<VSubjectListModelStore> allSubjects;
+  ObjectEvaluationWatch evaluation;
+  std::vector<std::unique_ptr<SubjectSection>> sections;
+  StoreUI::VStoreParameterModel setup;
+  StoreUI::VStoreParameterModel selected;
+  std::shared_ptr<VStoreObjectPresetModel> presets;
+  std::unique_ptr<VSubjectPanelQml> panel;
+  NMX::Subscription selectionChanges;
+};
+
+VSubjectStoreQml::VSubjectStoreQml(QQmlContext* rootContext, std::shared_ptr<ISelectionManager> selection,
+                                   std::shared_ptr<IPanelServices> panelServices,
+                                   std::shared_ptr<NMX::IPostalService> gui, std::shared_ptr<NMX::IStore> store)
+    : m_implementation(std::make_unique<Implementation>(
+          *this, PanelBackend{std::move(store), std::move(gui), std::move(selection), std::move(panelServices)}))
+{
+  QObjectList sections;
+  for (const auto& section : m_implementation->sections)
+    sections.append(&section->Model());
+  m_implementation->panel = std::make_unique<VSubjectPanelQml>(m_implementation->backend, sections);
+  connect(m_implementation->panel.get(), &VSubjectPanelQml::subjectAdded, this, &VSubjectStoreQml::focusSubject);
+  if (rootContext == nullptr)
+    return;
+  rootContext->setContextProperty("rootContextSubjectStore", this);
+  rootContext->setContextProperty("rootContextSubjectPanel", m_implementation->panel.get());
+}
+
+VSubjectStoreQml::~VSubjectStoreQml() = default;
+
+void VSubjectStoreQml::SetObjectPresetProvider(std::shared_ptr<RunaCorePluginInterface::IObjectPresetProvider> provider)
+{
+  m_implementation->panel->SetObjectPresetProvider(std::move(provider));
+}
+
+QVariantList VSubjectStoreQml::subjectWarnings() const
+{
+  return m_implementation->warnings.subjectWarnings();
+}
+
+double VSubjectStoreQml::objectEvaluationProgressDone() const
+{
+  return m_implementation->evaluation.Progress().first;
+}
+
+double VSubjectStoreQml::objectEvaluationProgressRequired() const
+{
+  return m_implementation->evaluation.Progress().second;
+}
+
+QObjectList VSubjectStoreQml::subjectTypeModels() const
+{
+  QObjectList models;
+  for (const auto& section : m_implementation->sections)
+  {
+    QQmlEngine::setObjectOwnership(&section->Model(), QQmlEngine::CppOwnership);
+    models.append(&section->Model());
+  }
+  return models;
+}
+
+QAbstractItemModel* VSubjectStoreQml::subjectSetupParameterModel() const
+{
+  return &m_implementation->setup;
+}
+
+QAbstractItemModel* VSubjectStoreQml::selectedSubjectParameterModel() const
+{
+  return &m_implementation->selected;
+}
+
+QAbstractItemModel* VSubjectStoreQml::objectPresetModel() const
+{
+  return m_implementation->presets.get();
+}
+
+uint VSubjectStoreQml::enabledFeatures() const
+{
+  return m_implementation->Features();
+}
+
+QVariantList VSubjectStoreQml::subjectStoreIdsBySelectionItems(const QVariantList& i_SubjectSelectionItems) const
+{
+  const auto access = m_implementation->backend.store->Reader();
+  std::vector<TSubjectStoreId> subjects = SubjectsOf(ToItems(i_SubjectSelectionItems));
+  std::erase_if(subjects,
+                [&](TSubjectStoreId id)
+                {
+                  ESubjectKind kind{};
+                  return access->Kind(id, kind).Failed();
+                });
+  return FromIds(subjects);
+}
+
+QVariantList VSubjectStoreQml::subjects() const
+{
+  return FromIds(m_implementation->data->Subjects(*m_implementation->backend.store->Reader(), {}));
+}
+
+QString VSubjectStoreQml::subjectNameRegex() const
+{
+  return QString::fromStdString(m_implementation->backend.store->Reader()->NamePattern());
+}
+
+bool VSubjectStoreQml::isSubjectNameInUse(const QString& i_SubjectName) const
+{
+  TSubjectStoreId id;
+  return m_implementation->backend.store->Reader()->FindByName(i_SubjectName.toStdString(), id).Succeeded();
+}
+
+QString VSubjectStoreQml::subjectName(const VStoreIdGadget& i_SubjectStoreId) const
+{
+  return m_implementation->backend.Name(i_SubjectStoreId.Id());
+}
+
+VResultGadget VSubjectStoreQml::setSubjectName(const VStoreIdGadget& i_SubjectStoreId, const QString& i_Name)
+{
+  const VResultGadget renamed = m_implementation->backend.Edit(
+      [&](NMX::IEntryEditor& editor)
+      { return editor.Rename(i_SubjectStoreId.Id(), i_Name.toStdString(), NMX::ENotify::Yes); });
+  if (renamed.Result() != EResult::InvalidName && renamed.Result() != EResult::AlreadyPresent)
+    return renamed;
+  return {renamed.Result(), m_implementation->panel->nameProblem(i_Name, i_SubjectStoreId).toStdString()};
+}
+
+uint VSubjectStoreQml::subjectFlags(const VStoreIdGadget& i_SubjectStoreId) const
+{
+  return m_implementation->backend.Entry<std::uint32_t>(i_SubjectStoreId.Id(), Paths::Flags()).value_or(0);
+}
+
+int VSubjectStoreQml::subjectCalibration(const VStoreIdGadget& i_SubjectStoreId) const
+{
+  return m_implementation->backend.Entry<std::int32_t>(i_SubjectStoreId.Id(), Paths::Calibration()).value_or(0);
+}
+
+bool VSubjectStoreQml::subjectEnabled(const VStoreIdGadget& i_SubjectStoreId) const
+{
+  return m_implementation->backend.Entry<bool>(i_SubjectStoreId.Id(), Paths::Enabled()).value_or(false);
+}
+
+VResultGadget VSubjectStoreQml::setSubjectsEnabled(const QVariantList& i_SubjectStoreIds, bool i_bEnabled)
+{
+  return m_implementation->backend.EditEach(ToIds(i_SubjectStoreIds), [&](NMX::IEntryEditor& editor, TSubjectStoreId id)
+                                            { return editor.SetValue(id, Paths::Enabled(), i_bEnabled); });
+}
+
+VResultGadget VSubjectStoreQml::toggleSubjectsEnabled(const QVariantList& i_SubjectStoreIds)
+{
+  return m_implementation->backend.EditEach(ToIds(i_SubjectStoreIds),
+                                            [](NMX::IEntryEditor& editor, TSubjectStoreId id)
+                                            {
+                                              bool enabled = false;
+                                              const IResult read = NMX::Read(editor, id, Paths::Enabled(), enabled);
+                                              return read.Failed() ? read
+                                                                   : editor.SetValue(id, Paths::Enabled(), !enabled);
+                                            });
+}
+
+VResultGadget VSubjectStoreQml::rebootSubjects(const QVariantList& i_SubjectStoreIds)
+{
+  const auto devices = m_implementation->backend.Get(&IPanelServices::Devices);
+  if (!devices)
+    return IResult(EResult::NotAvailable);
+  IResult result = EResult::InvalidArgument; // until there is a device
+  std::string reason;
+  for (const TSubjectStoreId id : ToIds(i_SubjectStoreIds))
+  {
+    const auto clusters = m_implementation->backend.Entry<Clusters>(id, Paths::SmartClusters()).value_or(Clusters{});
+    for (const NMX::SmartCluster& cluster : clusters)
+    {
+      if (cluster.deviceUrn.empty())
+        continue;
+      const IResult rebooted = devices->Reboot(cluster.deviceUrn);
+      if (rebooted.Failed() && reason.empty())
+        reason = "\"" + cluster.deviceUrn + "\" cannot be restarted: " + VResultGadget(rebooted).Reason().toStdString();
+      if (result.Succeeded() || result == EResult::InvalidArgument)
+        result = rebooted;
+    }
+  }
+  return {result, result == EResult::InvalidArgument ? "No device is linked to what is selected." : reason};
+}
+
+VResultGadget VSubjectStoreQml::removeSubjects(const QVariantList& i_SubjectStoreIds, bool i_bRemoveChildren)
+{
+  return m_implementation->backend.Edit(
+      [&](NMX::IEntryEditor& editor) -> IResult
+      {
+        std::vector<TSubjectStoreId> leaving;
+        for (const TSubjectStoreId id : ToIds(i_SubjectStoreIds))
+        {
+          std::vector<TSubjectStoreId> beneath{id};
+          if (i_bRemoveChildren)
+            if (const IResult listed = editor.Descendants(id, beneath); listed.Failed())
+              return listed;
+          leaving.insert(leaving.end(), beneath.begin(), beneath.end());
+        }
+        std::sort(leaving.begin(), leaving.end());
+        leaving.erase(std::unique(leaving.begin(), leaving.end()), leaving.end());
+        for (const TSubjectStoreId id : leaving)
+          if (const IResult removed = editor.Remove(id); removed.Failed())
+            return removed;
+        return leaving.empty() ? EResult::InvalidArgument : EResult::Ok;
+      });
+}
+
+int VSubjectStoreQml::smartClusterCount(const VStoreIdGadget& i_SubjectStoreId) const
+{
+  const auto clusters = m_implementation->backend.Entry<Clusters>(i_SubjectStoreId.Id(), Paths::SmartClusters());
+  return clusters ? static_cast<int>(clusters->size()) : 0;
+}
+
+QString VSubjectStoreQml::smartClusterLabel(const VStoreIdGadget& i_SubjectStoreId, int i_SmartClusterIndex) const
+{
+  const auto clusters = m_implementation->backend.Entry<Clusters>(i_SubjectStoreId.Id(), Paths::SmartClusters());
+  const auto index = static_cast<std::size_t>(i_SmartClusterIndex); // of a negative index far past the end
+  return clusters && index < clusters->size() ? QString::fromStdString((*clusters)[index].label) : QString();
+}
+
+bool VSubjectStoreQml::canCreateSmartObjects(const QVariantList& i_SelectionItems) const
+{
+  const auto controls = m_implementation->backend.Get(&IPanelServices::SmartObjectControls);
+  std::vector<std::string> names;
+  return controls &&
+         controls->CreateForDevices(DevicesOf(ToItems(i_SelectionItems)), ISmartObjectControls::ECreate::No, names)
+             .Succeeded();
+}
+
+VResultGadget VSubjectStoreQml::createSmartObjects(const QVariantList& i_SelectionItems)
+{
+  const auto controls = m_implementation->backend.Get(&IPanelServices::SmartObjectControls);
+  if (!controls)
+    return IResult(EResult::NotAvailable);
+  std::vector<std::string> names;
+  const IResult created =
+      controls->CreateForDevices(DevicesOf(ToItems(i_SelectionItems)), ISmartObjectControls::ECreate::Yes, names);
+  if (created == EResult::InvalidArgument)
+    return {created, "No device is selected."};
+  if (created == EResult::AlreadyPresent)
+    return {created, "A device is linked to a smart object already."};
+  if (created == EResult::NotFound)
+    return {created, "There is no smart object for that type of device."};
+  TSubjectStoreId first;
+  if (created.Succeeded() && !names.empty() &&
+      m_implementation->backend.store->Reader()->FindByName(names.front(), first).Succeeded())
+    Q_EMIT focusSubject(VStoreIdGadget(first));
+  return created;
+}
+
+VResultGadget VSubjectStoreQml::assignOptimalActiveMarkerPatterns(const QVariantList& /*i_SelectionItems*/)
+{
+  const auto controls = m_implementation->backend.Get(&IPanelServices::SmartObjectControls);
+  return controls ? controls->AssignOptimalPatterns() : IResult(EResult::NotAvailable);
+}
+
+bool VSubjectStoreQml::canMergeSelectedSmartObjects(const QVariantList& i_SelectionItems) const
+{
+  const auto objects = SubjectsOf(ToItems(i_SelectionItems));
+  return m_implementation->Can([&](const NMX::IStoreReader& access) { return Subjects::CheckMerge(access, objects); });
+}
+
+VResultGadget VSubjectStoreQml::mergeSelectedSmartObjects(const QVariantList& i_SelectionItems)
+{
+  const auto objects = SubjectsOf(ToItems(i_SelectionItems));
+  return m_implementation->backend.Edit([&](NMX::IEntryEditor& editor) { return Subjects::Merge(editor, objects); });
+}
+
+bool VSubjectStoreQml::canSplitSelectedSmartObjects(const QVariantList& i_SelectionItems) const
+{
+  const auto objects = SubjectsOf(ToItems(i_SelectionItems));
+  return m_implementation->Can([&](const NMX::IStoreReader& access) { return Subjects::CheckSplit(access, objects); });
+}
+
+VResultGadget VSubjectStoreQml::splitSelectedSmartObjects(const QVariantList& i_SelectionItems)
+{
+  const auto objects = SubjectsOf(ToItems(i_SelectionItems));
+  return m_implementation->backend.Edit([&](NMX::IEntryEditor& editor) { return Subjects::Split(editor, objects); });
+}
+
+bool VSubjectStoreQml::canSwapSmartClusters(const VStoreIdGadget& i_FirstSubjectId,
+                                            const VStoreIdGadget& i_SecondSubjectId) const
+{
+  return m_implementation->Can([&](const NMX::IStoreReader& access)
+                               { return Subjects::CheckSwap(access, i_FirstSubjectId.Id(), i_SecondSubjectId.Id()); });
+}
+
+VResultGadget VSubjectStoreQml::swapSmartClusters(const VStoreIdGadget& i_FirstSubjectId,
+                                                  const VStoreIdGadget& i_SecondSubjectId, int i_FirstClusterIndex,
+                                                  int i_SecondClusterIndex)
+{
+  return m_implementation->backend.Edit(
+      [&](NMX::IEntryEditor& editor)
+      {
+        // A negative index becomes one far past the end.
+        return Subjects::Swap(editor, i_FirstSubjectId.Id(), static_cast<std::uint32_t>(i_FirstClusterIndex),
+                              i_SecondSubjectId.Id(), static_cast<std::uint32_t>(i_SecondClusterIndex));
+      });
+}
+
+VResultGadget VSubjectStoreQml::calibrateCFC(const QVariantList& i_SubjectStoreIds)
+{
+  const auto controls = m_implementation->backend.Get(&IPanelServices::CharacterControls);
+  if (!controls)
+    return IResult(EResult::NotAvailable);
+  return m_implementation->backend.EditEach(ToIds(i_SubjectStoreIds),
+                                            [&](NMX::IEntryEditor& editor, TSubjectStoreId id)
+                                            {
+                                              const IResult is = Subjects::MustBeCharacter(editor, id);
+                                              return is.Failed() ? is : controls->Calibrate(editor, id);
+                                            });
+}
+
+VResultGadget VSubjectStoreQml::decalibrateCFC(const QVariantList& i_SubjectStoreIds)
+{
+  const auto controls = m_implementation->backend.Get(&IPanelServices::CharacterControls);
+  if (!controls)
+    return IResult(EResult::NotAvailable);
+  return m_implementation->backend.EditEach(ToIds(i_SubjectStoreIds),
+                                            [&](NMX::IEntryEditor& editor, TSubjectStoreId id)
+                                            {
+                                              const IResult is = Subjects::MustBeCharacter(editor, id);
+                                              return is.Failed() ? is : controls->ClearCalibration(editor, id);
+                                            });
+}
+
+bool VSubjectStoreQml::canAssignSubjectToSlot(const VStoreIdGadget& i_SubjectStoreId,
+                                              const VSelectionItemGadget& i_EmptySubjectSlotSelectionItem) const
+{
+  const SelectionItem& slot = i_EmptySubjectSlotSelectionItem.Item();
+  return m_implementation->Can(
+      [&](const NMX::IStoreReader& access)
+      {
+        return Subjects::CheckAssign(access, i_SubjectStoreId.Id(), slot.subject,
+                                     static_cast<std::uint32_t>(slot.slot));
+      });
+}
+
+VResultGadget VSubjectStoreQml::assignSubjectToSlot(const VStoreIdGadget& i_SubjectStoreId,
+                                                    const VSelectionItemGadget& i_EmptySubjectSlotSelectionItem)
+{
+  const SelectionItem& slot = i_EmptySubjectSlotSelectionItem.Item();
+  return m_implementation->backend.Edit(
+      [&](NMX::IEntryEditor& editor)
+      { return Subjects::Assign(editor, i_SubjectStoreId.Id(), slot.subject, static_cast<std::uint32_t>(slot.slot)); });
+}
+
+bool VSubjectStoreQml::canUnassignSubjects(const QVariantList& i_SubjectStoreIds) const
+{
+  const auto objects = ToIds(i_SubjectStoreIds);
+  return m_implementation->Can([&](const NMX::IStoreReader& access)
+                               { return Subjects::CheckUnassign(access, objects); });
+}
+
+VResultGadget VSubjectStoreQml::unassignSubjects(const QVariantList& i_SubjectStoreIds)
+{
+  const auto objects = ToIds(i_SubjectStoreIds);
+  return m_implementation->backend.Edit([&](NMX::IEntryEditor& editor) { return Subjects::Unassign(editor, objects); });
+}
+
+bool VSubjectStoreQml::anySubjectManuallyAssignable() const
+{
+  const auto access = m_implementation->backend.store->Reader();
+  return !Subjects::UnassignedObjects(*access).empty() && !Subjects::EmptySlots(*access).empty();
+}
+
+bool VSubjectStoreQml::canDetachClusters(const QVariantList& i_SubjectStoreIds) const
+{
+  return canUnassignSubjects(i_SubjectStoreIds);
+}
+
+VResultGadget VSubjectStoreQml::detachClusters(const QVariantList& i_SubjectStoreIds)
+{
+  const auto objects = ToIds(i_SubjectStoreIds);
+  return m_implementation->backend.Edit([&](NMX::IEntryEditor& editor) { return Subjects::Detach(editor, objects); });
+}
+
+VResultGadget VSubjectStoreQml::addModel(const QString& i_ModelName)
+{
+  return m_implementation->SetModelOutput(i_ModelName, true);
+}
+
+VResultGadget VSubjectStoreQml::removeModel(const QString& i_ModelName)
+{
+  return m_implementation->SetModelOutput(i_ModelName, false);
+}
+
+VCalibrationScalingQml* VSubjectStoreQml::createCalibrationScalingOperation()
+{
+  auto operation = VCalibrationScalingQml::Make(m_implementation->backend, m_implementation->FirstSelected());
+  if (!operation)
+    return nullptr;
+  operation->setParent(this);
+  QQmlEngine::setObjectOwnership(operation.get(), QQmlEngine::CppOwnership);
+  return operation.release();
+}
+
+const PanelBackend& VSubjectStoreQml::Backend() const
+{
+  return m_implementation->backend;
+}
+
+}
