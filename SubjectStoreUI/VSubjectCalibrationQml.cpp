@@ -120,6 +120,8 @@ QString VSubjectCalibrationQml::lastResult() const
   const IResult last = m_implementation->controller->LastResult();
   if (last == EResult::NotSet)
     return {};
+  if (last == EResult::Canceled)
+    return tr("The last calibration was cancelled.");
   return last.Succeeded() ? tr("The last calibration was completed.")
                           : tr("The last calibration failed: %1").arg(VResultGadget(last).Reason());
 }

@@ -1,18 +1,24 @@
 #include "HostInterface/IFileLocations.h"
 #include "HostInterface/IRunaCoreFileIO.h"
 #include "HostInterface/RunaCorePluginInterface/IPluginSettings.h"
-#include "StandaloneHost/Characters/VCharacterControls.h"
+#include "StandaloneHost/Calibration/VCalibrationProvider.h"
+#include "StandaloneHost/Panel/VPanelServices.h"
+#include "StandaloneHost/Panel/VSelectionManager.h"
+#include "StandaloneHost/Settings/PanelSettings.h"
+#include "StandaloneHost/Simulation/VDeviceServices.h"
 #include "StandaloneHost/SmartObjects/VSmartObjectControls.h"
 #include "StoreInterface/SettingsPaths.h"
 #include "StoreUI/VStoreParameterModel.h"
 #include "SubjectStoreUI/QmlRegistration.h"
 #include "SubjectStoreUI/VCalibrationScalingQml.h"
+#include "SubjectStoreUI/VDeviceModel.h"
 #include "SubjectStoreUI/VPanelRowsModel.h"
 #include "SubjectStoreUI/VSubjectPanelQml.h"
 #include "SubjectStoreUI/VSubjectStoreQml.h"
 #include "tests/Support/LogCapture.h"
 #include "tests/Support/ManualAsioPostal.h"
 #include "tests/Support/ModelFixture.h"
+#include "tests/Support/ModelShadow.h"
 #include "tests/Support/TemporaryFolder.h"
 
 #include <QMetaMethod>
@@ -65,30 +71,6 @@ struct OneFolder : IFileLocations
   std::wstring user;
 };
 
-struct StageSelection : ISelectionManager
-{
-  std::vector<SelectionItem> Selection() const override { return items; }
-  void Select(std::vector<SelectionItem> selected) override
-  {
-    items = std::move(selected);
-    if (changed)
-      changed();
-  }
-  NMX::Subscription OnChange(std::function<void()> handler) override
-  {
-    // Two subscribe.
-    changed = [before = changed, handler = std::move(handler)]
-    {
-      if (before)
-        before();
-      handler();
-    };
-    return std::make_shared<int>();
-  }
-  std::vector<SelectionItem> items;
-  std::function<void()> changed;
-};
-
 struct Features : RunaCorePluginInterface::IFeatures
 {
   explicit Features(std::uint32_t bits) : mask(bits) {}
@@ -96,45 +78,39 @@ struct Features : RunaCorePluginInterface::IFeatures
   const std::uint32_t mask;
 };
 
-struct Services : RunaCorePluginInterface::IPanelServices
-{
-  void Features(std::shared_ptr<RunaCorePluginInterface::IFeatures>& out) const override { out = features; }
-  void FileIO(std::shared_ptr<IRunaCoreFileIO>& out) const override { out = fileIO; }
-  void FileLocations(std::shared_ptr<IFileLocations>& out) const override { out = locations; }
-  void
-  ObjectEvaluationSettings(std::shared_ptr<RunaCorePluginInterface::IObjectEvaluationSettings>& /*out*/) const override
-  {
-  }
-  void SmartObjectControls(std::shared_ptr<ISmartObjectControls>& out) const override { out = smartObjects; }
-  void CharacterControls(std::shared_ptr<ICharacterControls>& out) const override { out = characters; }
-  void Devices(std::shared_ptr<IDeviceServices>& /*out*/) const override {}
-  void CalibrationProvider(std::shared_ptr<RunaCorePluginInterface::ICalibrationProvider>& /*out*/) const override {}
-
-  std::shared_ptr<RunaCorePluginInterface::IFeatures> features;
-  std::shared_ptr<MockFileIO> fileIO = std::make_shared<testing::StrictMock<MockFileIO>>();
-  std::shared_ptr<OneFolder> locations = std::make_shared<OneFolder>();
-  std::shared_ptr<ISmartObjectControls> smartObjects;
-  std::shared_ptr<ICharacterControls> characters;
-};
-
 class PanelTest : public ModelFixture
 {
 protected:
   PanelTest()
   {
-    services->smartObjects =
+    services.fileIO = fileIO;
+    services.fileLocations = locations;
+    services.smartObjects =
         std::make_shared<SmartObjects::VSmartObjectControls>(store, std::make_shared<SmartObjects::DeviceLayouts>());
-    services->locations->shipped =
+    services.devices = std::make_shared<Simulation::VDeviceServices>(store, timers);
+    locations->shipped =
         (std::filesystem::path(SUBJECT_STORE_SOURCE_DIR) / "StandaloneHost/SmartObjects/Templates").wstring();
-    services->locations->user = (folder.Path() / "user").wstring();
+    locations->user = (folder.Path() / "user").wstring();
   }
 
   /// The panel's object, in a host with these features.
-  VSubjectStoreQml& Panel(std::uint32_t mask = 0xFFFFFFFF)
+  VSubjectStoreQml& MakePanel(std::uint32_t mask = 0xFFFFFFFF, QQmlContext* context = nullptr)
   {
-    services->features = std::make_shared<Features>(mask);
-    m_panel = std::make_unique<VSubjectStoreQml>(nullptr, selection, services, gui, store);
+    services.features = std::make_shared<Features>(mask);
+    m_panel = std::make_unique<VSubjectStoreQml>(context, selection, std::make_shared<Panel::VPanelServices>(services),
+                                                 gui, store);
     return *m_panel;
+  }
+
+  /// Lets everything be told that is to be told.
+  void Wait()
+  {
+    for (int i = 0; i < 20; ++i)
+    {
+      gui->RunAll();
+      QCoreApplication::processEvents(QEventLoop::AllEvents, 20);
+      QThread::msleep(10);
+    }
   }
 
   static VStoreIdGadget Gadget(Id id) { return VStoreIdGadget(id); }
@@ -154,8 +130,11 @@ protected:
   }
 
   const TemporaryFolder folder;
-  const std::shared_ptr<StageSelection> selection = std::make_shared<StageSelection>();
-  const std::shared_ptr<Services> services = std::make_shared<Services>();
+  const std::shared_ptr<ManualAsioPostal> timers = std::make_shared<ManualAsioPostal>();
+  const std::shared_ptr<Panel::VSelectionManager> selection = std::make_shared<Panel::VSelectionManager>();
+  const std::shared_ptr<MockFileIO> fileIO = std::make_shared<testing::StrictMock<MockFileIO>>();
+  const std::shared_ptr<OneFolder> locations = std::make_shared<OneFolder>();
+  Panel::ServicesForPanel services;
 
 private:
   std::unique_ptr<VSubjectStoreQml> m_panel;
@@ -243,8 +222,7 @@ TEST_F(PanelTest, TheModuleHasItsConstantsWhichQmlCannotChange)
   QQmlEngine engine;
   AddModuleFiles(engine);
   QQmlContext& root = *engine.rootContext();
-  services->features = std::make_shared<Features>(0xFFFFFFFF);
-  VSubjectStoreQml panel(&root, selection, services, gui, store);
+  MakePanel(0xFFFFFFFF, &root);
   Add(ESubjectKind::BasicObjects, "Crate");
   const auto evaluate = [&](const char* expression)
   {
@@ -293,42 +271,33 @@ TEST_F(PanelTest, EachFeatureHasItsSections)
            {0x5038, {"Subjects", "Labelling clusters", "Markerless", "Props", "Scene meshes"}}})
   {
     Names headings;
-    for (QObject* section : Panel(mask).subjectTypeModels())
+    for (QObject* section : MakePanel(mask).subjectTypeModels())
       headings.push_back(section->property("typeDisplayName").toString().toStdString());
     EXPECT_EQ(headings, expected);
-    EXPECT_EQ(Panel(mask).objectPresetModel(), nullptr);
+    EXPECT_EQ(MakePanel(mask).objectPresetModel(), nullptr);
   }
-  EXPECT_NE(Panel(0x40).objectPresetModel(), nullptr);
-  EXPECT_EQ(Panel(0x41).enabledFeatures(), 0x41U);
+  EXPECT_NE(MakePanel(0x40).objectPresetModel(), nullptr);
+  EXPECT_EQ(MakePanel(0x41).enabledFeatures(), 0x41U);
 }
 
 TEST_F(PanelTest, ElementsAreBackAfterTheStoreWasEmpty)
 {
-  auto& section = *qobject_cast<VSortSubjectsProxyModel*>(Panel(1).subjectTypeModels().value(0));
-  const auto wait = [&]
-  {
-    for (int i = 0; i < 20; ++i)
-    {
-      gui->RunAll();
-      QCoreApplication::processEvents(QEventLoop::AllEvents, 20);
-      QThread::msleep(10);
-    }
-  };
+  auto& section = *qobject_cast<VSortSubjectsProxyModel*>(MakePanel(1).subjectTypeModels().value(0));
   for (const char* name : {"Crate", "Box"})
   {
     const Id id = Add(ESubjectKind::BasicObjects, name);
     Set(id, Paths::Markers(), std::vector<NMX::Position>{{1, 2, 3}});
-    wait();
+    Wait();
     EXPECT_THAT(NamesBeneath(section, section.index(0, 0)), ElementsAre("Marker 1")) << name;
     Remove(id);
-    wait();
+    Wait();
     EXPECT_EQ(section.rowCount(), 0);
   }
 }
 
 TEST_F(PanelTest, AnEditOfSeveralSubjectsIsAllOrNothing)
 {
-  VSubjectStoreQml& panel = Panel();
+  VSubjectStoreQml& panel = MakePanel();
   const Id crate = Add(ESubjectKind::BasicObjects, "Crate");
   const Id glove = Add(ESubjectKind::SmartObjects, "Glove");
   Set(glove, Paths::Enabled(), false);
@@ -365,7 +334,7 @@ TEST_F(PanelTest, AnEditOfSeveralSubjectsIsAllOrNothing)
 
 TEST_F(PanelTest, WhatIsOfferedForDevicesIsWhatIsAccepted)
 {
-  VSubjectStoreQml& panel = Panel();
+  VSubjectStoreQml& panel = MakePanel();
   for (const char* urn : {"urn-1", "urn-2"})
     SetApplication(std::string("Application/Devices/") + urn + "/Type", std::string("Corvex1"));
   SetApplication("Application/Devices/urn-3/Type", std::string("Other"));
@@ -387,7 +356,7 @@ TEST_F(PanelTest, WhatIsOfferedForDevicesIsWhatIsAccepted)
 
 TEST_F(PanelTest, FilesAreThoseOfThisMachine)
 {
-  VSubjectStoreQml& panel = Panel();
+  VSubjectStoreQml& panel = MakePanel();
   const QUrl local = QUrl::fromLocalFile("/tmp/a b \u00e9.xml");
   for (const char* url : {"", "http://example.com/a.xml", "qrc:/a.xml", "a.xml", "file:///a%00b.xml"})
   {
@@ -396,7 +365,7 @@ TEST_F(PanelTest, FilesAreThoseOfThisMachine)
     EXPECT_EQ(panel.copyFileToUserFolder(QUrl(url), VSubjectStoreQml::ESmartObjectTemplate).Name(), "InvalidName");
   }
   const std::wstring path = L"/tmp/a b \u00e9.xml";
-  MockFileIO& files = *services->fileIO;
+  MockFileIO& files = *fileIO;
   EXPECT_CALL(files, LoadSubjectConfiguration(path, _))
       .WillOnce(DoAll(SetArgReferee<1>("line 3 is wrong"), Return(EResult::SerialisationFailure)));
   const VResultGadget loaded = panel.loadSubjectConfiguration(local);
@@ -414,7 +383,7 @@ TEST_F(PanelTest, FilesAreThoseOfThisMachine)
 
 TEST_F(PanelTest, AFileIsCopiedToTheUsersFolderButNeverOverOne)
 {
-  VSubjectStoreQml& panel = Panel();
+  VSubjectStoreQml& panel = MakePanel();
   const auto file = folder.Path() / "My template.sot";
   std::ofstream(file) << "first";
   const QUrl url = QUrl::fromLocalFile(QString::fromStdString(file.string()));
@@ -444,7 +413,7 @@ TEST_F(PanelTest, AFileIsCopiedToTheUsersFolderButNeverOverOne)
 
 TEST_F(PanelTest, ParametersAreThoseOfTheFirstSelectedSubjectAndAreEdited)
 {
-  VSubjectStoreQml& panel = Panel();
+  VSubjectStoreQml& panel = MakePanel();
   QAbstractItemModel& model = *panel.selectedSubjectParameterModel();
   EXPECT_EQ(model.rowCount(), 0);
   const Id crate = Add(ESubjectKind::BasicObjects, "Crate");
@@ -488,7 +457,7 @@ TEST_F(PanelTest, ParametersAreThoseOfTheFirstSelectedSubjectAndAreEdited)
 
 TEST_F(PanelTest, AnObjectIsScaledToWhatWasMeasured)
 {
-  VSubjectStoreQml& panel = Panel();
+  VSubjectStoreQml& panel = MakePanel();
   const Id crate = Add(ESubjectKind::BasicObjects, "Crate");
   selection->Select({{crate, -1, {}}});
   EXPECT_EQ(panel.createCalibrationScalingOperation(), nullptr) << "no markers";
@@ -507,4 +476,90 @@ TEST_F(PanelTest, AnObjectIsScaledToWhatWasMeasured)
   Set(crate, Paths::Markers(), std::vector<NMX::Position>{{0, 0, 0}, {3, 4, 0}});
   EXPECT_EQ(operation->apply().Name(), "Ok");
   EXPECT_EQ(Get<std::vector<NMX::Position>>(crate, Paths::Markers()).at(1), (NMX::Position{6, 8, 0}));
+}
+
+TEST_F(PanelTest, DevicesAreListedWithWhatTheyAreLinkedTo)
+{
+  const auto addDevice = [&](const std::string& urn, bool connected)
+  {
+    SetApplication("Application/Devices/" + urn + "/Type", std::string("Corvex1"));
+    SetApplication("Application/Devices/" + urn + "/Connected", connected);
+  };
+  addDevice("b", true);
+  QQmlEngine engine;
+  VSubjectStoreQml& panel = MakePanel(0xFFFFFFFF, engine.rootContext());
+  auto& work = *engine.rootContext()->contextProperty("rootContextSubjectPanel").value<VSubjectPanelQml*>();
+  QAbstractItemModel& devices = *work.devices();
+  const ModelShadow shadow(devices);
+  addDevice("a", false);
+  const Id glove = Add(ESubjectKind::SmartObjects, "Glove");
+  EXPECT_EQ(panel.rebootSubjects(List({glove})).Reason(), "No device is linked to what is selected.");
+  Set(glove, Paths::SmartClusters(), std::vector<NMX::SmartCluster>{{"Back", "b", 1, "Corvex1"}, {"Palm", "a", 2, ""}});
+  Wait();
+  shadow.Check();
+  Names told;
+  for (int row = 0; row < devices.rowCount(); ++row)
+    for (const int role : {VDeviceModel::Urn, VDeviceModel::Connected, VDeviceModel::LinkedTo})
+      told.push_back(devices.index(row, 0).data(role).toString().toStdString());
+  EXPECT_THAT(told, ElementsAre("a", "false", "Glove", "b", "true", "Glove"));
+
+  const VResultGadget rebooted = panel.rebootSubjects(List({glove}));
+  EXPECT_EQ(rebooted.Name(), "NotConnected") << "the other was tried all the same";
+  EXPECT_EQ(rebooted.Reason(), "\"a\" cannot be restarted: The device is not connected.");
+  SetApplication("Application/Devices/a/Type", {});
+  SetApplication("Application/Devices/a/Connected", {});
+  Wait();
+  shadow.Check();
+  ASSERT_EQ(devices.rowCount(), 1);
+  EXPECT_EQ(devices.index(0, 0).data(VDeviceModel::Connected), false);
+  EXPECT_EQ(work.setClusterPattern(VStoreIdGadget(glove), 0, 5).Name(), "Ok");
+  EXPECT_EQ(work.setClusterPattern(VStoreIdGadget(glove), 0, -1).Name(), "InvalidValue");
+  EXPECT_EQ(work.setClusterPattern(VStoreIdGadget(glove), 2, 1).Name(), "InvalidIndex");
+  static_cast<Simulation::VDeviceServices&>(*services.devices).Stop();
+}
+
+TEST_F(PanelTest, CalibrationSaysWhatIsPossibleAndWhyNot)
+{
+  const std::filesystem::path shipped = std::filesystem::path(SUBJECT_STORE_SOURCE_DIR) / "StandaloneHost/Calibration";
+  ASSERT_TRUE(
+      Settings::SetUpPanelSettings(*store, {{}, {}, {shipped / "Templates"}, {shipped / "Skins"}, {}}).Succeeded());
+  const auto provider =
+      std::make_shared<Calibration::VCalibrationProvider>(store, timers, Calibration::CalibrationTimes{});
+  provider->Open(gui);
+  services.calibration = provider;
+  QQmlEngine engine;
+  VSubjectStoreQml& panel = MakePanel(0xFFFFFFFF, engine.rootContext());
+  VSubjectCalibrationQml& calibration =
+      *engine.rootContext()->contextProperty("rootContextSubjectPanel").value<VSubjectPanelQml*>()->calibration();
+  int told = 0;
+  QObject::connect(&calibration, &VSubjectCalibrationQml::changed, &calibration, [&] { ++told; });
+  EXPECT_EQ(calibration.cannotStart(), "No name is given.");
+  EXPECT_EQ(calibration.start().Reason(), "No name is given.");
+  EXPECT_EQ(calibration.stop().Name(), "NotAvailable");
+
+  QAbstractItemModel& setup = *panel.subjectSetupParameterModel();
+  EXPECT_TRUE(setup.setData(setup.index(0, 0), "Ada", StoreUI::ParameterRole::Value));
+  Wait();
+  EXPECT_GT(std::exchange(told, 0), 0);
+  EXPECT_EQ(calibration.cannotStart(), "");
+  EXPECT_EQ(calibration.start().Name(), "Ok");
+  EXPECT_TRUE(calibration.running());
+  EXPECT_EQ(calibration.state(), "Looking for the T-pose");
+  Wait();
+  EXPECT_GT(told, 0);
+  EXPECT_EQ(calibration.acceptTPose().Name(), "Ok");
+  EXPECT_EQ(calibration.cancel().Name(), "Ok");
+  EXPECT_EQ(calibration.lastResult(), "The last calibration was cancelled.");
+
+  // Whoever has started a run, the panel can end it.
+  Wait();
+  EXPECT_EQ(calibration.cannotRecalibrate(), "");
+  std::shared_ptr<ISubjectCalibrationController> controller;
+  provider->Controller(controller);
+  NMX::TCalibrationSessionId session;
+  EXPECT_EQ(controller->Perform(ECalibrationAction::StartRecalibration, session), IResult(EResult::Ok));
+  EXPECT_EQ(calibration.acceptTPose().Name(), "Ok");
+  EXPECT_EQ(calibration.stop().Name(), "Ok");
+  EXPECT_EQ(calibration.lastResult(), "The last calibration was completed.");
+  provider->Stop();
 }
