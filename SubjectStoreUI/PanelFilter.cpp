@@ -30,7 +30,7 @@ bool PanelFilter::Judge(const PanelSection& section, PanelRow& subject) const
   bool holdsMatch = false;
   bool warned = subject.warnings > 0;
   int passing = 0;
-  for (const auto& row : subject.beneath)
+  for (PanelRow* row : subject.beneath)
   {
     const bool found = Searching() && Matches(section, *row);
     set(row->passes, matches || found);

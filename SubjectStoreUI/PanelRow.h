@@ -2,11 +2,11 @@
 
 #include "HostInterface/NMX/ITypedId.h"
 
+#include <QList>
 #include <QString>
 #include <QStringList>
 
 #include <cstddef>
-#include <memory>
 #include <optional>
 #include <vector>
 
@@ -23,6 +23,9 @@ enum class EPanelRow
   Element
 };
 
+/// The kind as QML knows it.
+[[nodiscard]] QString KindText(EPanelRow kind);
+
 /// What the list itself says of a row.
 struct PanelRowValues
 {
@@ -35,13 +38,16 @@ struct PanelRowValues
   QString parentName;
 };
 
+/// The roles in which they differ.
+[[nodiscard]] QList<int> Differences(const PanelRowValues& before, const PanelRowValues& now);
+
 /// A row of a section, whether the list shows it or not. It stays at its address for as long as somebody may ask for
 /// it, also when the section's model has it no more.
 struct PanelRow
 {
   EPanelRow kind = EPanelRow::Subject;
   PanelRow* above = nullptr; ///< null for a section
-  std::vector<std::unique_ptr<PanelRow>> beneath;
+  std::vector<PanelRow*> beneath;
 
   // What PanelSection knows of it.
   bool there = true;     ///< the section's model has it
@@ -60,7 +66,7 @@ struct PanelRow
   int sourceRow = 0;                ///< while the section sorts
 
   // What PanelFilter thinks of it.
-  bool passes = true;
+  bool passes = true;      ///< not of a section
   bool holdsMatch = false; ///< a search finds something beneath it
   int passing = 0;         ///< how many rows beneath pass
 

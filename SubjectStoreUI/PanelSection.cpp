@@ -46,7 +46,7 @@ void Survey(PanelRow& subject)
   int clusters = 0;
   int markers = 0;
   subject.holdsChild = false;
-  for (const auto& row : subject.beneath)
+  for (PanelRow* row : subject.beneath)
   {
     if (row->kind == EPanelRow::Element)
       row->element = row->marker ? markers++ : clusters++;
@@ -78,11 +78,7 @@ void PanelSection::Follow(VSortSubjectsProxyModel& model)
 {
   using M = QAbstractItemModel;
   const auto begin = [this] { Begin(); };
-  const auto replace = [this]
-  {
-    m_replaced = true;
-    End();
-  };
+  const auto replace = [this] { Replace(); };
   const auto on = [&](auto signal, auto slot) { QObject::connect(&model, signal, &m_context, slot); };
   on(&M::dataChanged, [this](const QModelIndex& first, const QModelIndex& last, const QList<int>& roles)
      { OnDataChanged(first, last, roles); });
@@ -115,7 +111,7 @@ QModelIndex PanelSection::SourceIndex(const PanelRow& row) const
   if (!m_model || row.above == nullptr)
     return {};
   const auto& siblings = row.above->beneath;
-  if (At(row.place) >= siblings.size() || siblings[At(row.place)].get() != &row)
+  if (At(row.place) >= siblings.size() || siblings[At(row.place)] != &row)
     for (std::size_t place = 0; place < siblings.size(); ++place)
       siblings[place]->place = static_cast<int>(place);
   return m_model->index(row.place, 0, SourceIndex(*row.above));
@@ -141,7 +137,13 @@ PanelRow* PanelSection::Find(const QModelIndex& index)
   if (!index.isValid())
     return &m_header;
   const PanelRow* above = Find(index.parent());
-  return above != nullptr && At(index.row()) < above->beneath.size() ? above->beneath[At(index.row())].get() : nullptr;
+  return above != nullptr && At(index.row()) < above->beneath.size() ? above->beneath[At(index.row())] : nullptr;
+}
+
+void PanelSection::Replace()
+{
+  m_replaced = true;
+  End();
 }
 
 void PanelSection::End()
@@ -160,7 +162,7 @@ void PanelSection::OnDataChanged(const QModelIndex& first, const QModelIndex& la
     above->unsorted = m_sortDue = true;
   if (reread || m_sortDue)
     m_changed();
-  // Whoever hears of a row may edit, and the model may have others then.
+  // Whoever hears of a row may edit, and the others may have gone then.
   std::vector<PanelRow*> rows;
   for (int place = first.row(); place <= last.row() && At(place) < above->beneath.size(); ++place)
   {
@@ -173,26 +175,21 @@ void PanelSection::OnDataChanged(const QModelIndex& first, const QModelIndex& la
     m_stale.push_back(&row);
   }
   for (PanelRow* row : rows)
-    m_dataChanged(*row, roles);
+    if (m_rows.contains(row))
+      m_dataChanged(*row, roles);
 }
 
 void PanelSection::OnInserted(const QModelIndex& parent, int first, int last)
 {
   if (PanelRow* above = Find(parent); above != nullptr && above->listed)
   {
-    std::vector<std::unique_ptr<PanelRow>> rows;
-    for (int place = first; place <= last; ++place)
-    {
-      rows.push_back(std::make_unique<PanelRow>());
-      rows.back()->above = above;
-      rows.back()->place = place;
-    }
-    above->unsorted = m_sortDue = true;
     if (At(first) > above->beneath.size())
-      m_replaced = true;
-    else
-      above->beneath.insert(above->beneath.begin() + first, std::move_iterator(rows.begin()),
-                            std::move_iterator(rows.end()));
+      return Replace();
+    std::vector<PanelRow*> rows;
+    for (int place = first; place <= last; ++place)
+      rows.push_back(Make(*above, place));
+    above->beneath.insert(above->beneath.begin() + first, rows.begin(), rows.end());
+    above->unsorted = m_sortDue = true;
     m_rowsChanged = true;
   }
   End();
@@ -202,12 +199,12 @@ void PanelSection::OnRemoved(const QModelIndex& parent, int first, int last)
 {
   if (PanelRow* above = Find(parent); above != nullptr && above->listed)
   {
-    auto& rows = above->beneath;
-    const auto end = rows.begin() + std::min(last + 1, static_cast<int>(rows.size()));
-    const auto begin = std::min(rows.begin() + first, end);
-    for (auto row = begin; row != end; ++row)
-      Leave(std::move(*row));
-    rows.erase(begin, end);
+    if (At(last) >= above->beneath.size())
+      return Replace();
+    const auto begin = above->beneath.begin() + first;
+    const auto end = above->beneath.begin() + last + 1;
+    std::for_each(begin, end, [this](PanelRow* row) { Leave(row); });
+    above->beneath.erase(begin, end);
     m_rowsChanged = true;
   }
   End();
@@ -221,9 +218,9 @@ std::vector<PanelRow*> PanelSection::Sortable()
   const SortedBy now{m_model->sortRole(), m_model->sortColumn(), m_model->sortOrder()};
   const bool all = std::exchange(m_sortedBy, now) != now || m_model->sortRole() != Role::SubjectProxySortName;
   std::vector<PanelRow*> lists{&m_header};
-  for (const auto& subject : m_header.beneath)
+  for (PanelRow* subject : m_header.beneath)
     if (subject->listed && subject->beneath.size() > 1 && (all || subject->unsorted || subject->holdsChild))
-      lists.push_back(subject.get());
+      lists.push_back(subject);
   return lists;
 }
 
@@ -285,10 +282,10 @@ bool PanelSection::Rearrange(PanelRow& above)
   }
   if (std::is_sorted(order.begin(), order.end()))
     return true;
-  std::vector<std::unique_ptr<PanelRow>> rows;
+  std::vector<PanelRow*> rows;
   for (const std::size_t place : order)
   {
-    rows.push_back(std::move(above.beneath[place]));
+    rows.push_back(above.beneath[place]);
     rows.back()->place = static_cast<int>(rows.size()) - 1;
   }
   above.beneath = std::move(rows);
@@ -298,8 +295,8 @@ bool PanelSection::Rearrange(PanelRow& above)
 
 void PanelSection::OnGone()
 {
-  for (auto& row : std::exchange(m_header.beneath, {}))
-    Leave(std::move(row));
+  for (PanelRow* row : std::exchange(m_header.beneath, {}))
+    Leave(row);
   m_header.there = false;
   m_replaced = false;
   m_rowsChanged = true;
@@ -307,12 +304,23 @@ void PanelSection::OnGone()
   End();
 }
 
-void PanelSection::Leave(std::unique_ptr<PanelRow> row)
+PanelRow* PanelSection::Make(PanelRow& above, int place)
+{
+  auto row = std::make_unique<PanelRow>();
+  row->above = &above;
+  row->place = place;
+  PanelRow* made = row.get();
+  m_rows.emplace(made, std::move(row));
+  return made;
+}
+
+/// It and what is beneath it are kept until whoever shows them knows.
+void PanelSection::Leave(PanelRow* row)
 {
   row->there = false;
-  for (const auto& beneath : row->beneath)
-    beneath->there = false;
-  m_left.push_back(std::move(row));
+  for (PanelRow* beneath : row->beneath)
+    Leave(beneath);
+  m_left.push_back(std::move(m_rows.extract(row).mapped()));
 }
 
 PanelSection::News PanelSection::Update()
@@ -362,13 +370,13 @@ void PanelSection::Read(PanelRow& row, const QModelIndex& index) const
 
 void PanelSection::ReadNew()
 {
-  for (const auto& subject : m_header.beneath)
+  for (PanelRow* subject : m_header.beneath)
   {
     if (!subject->read)
       Read(*subject, SourceIndex(*subject));
     if (!subject->listed)
       List(*subject);
-    for (const auto& row : subject->beneath)
+    for (PanelRow* row : subject->beneath)
       if (!row->read)
         Read(*row, SourceIndex(*row));
     Survey(*subject);
@@ -378,32 +386,32 @@ void PanelSection::ReadNew()
 /// Reads the rows beneath one from the beginning. Those that can be recognised stay.
 void PanelSection::List(PanelRow& above)
 {
-  std::multimap<decltype(KeyOf(above)), std::unique_ptr<PanelRow>> known;
-  for (auto& row : std::exchange(above.beneath, {}))
-    known.emplace(KeyOf(*row), std::move(row));
+  std::multimap<decltype(KeyOf(above)), PanelRow*> known;
+  for (PanelRow* row : std::exchange(above.beneath, {}))
+    known.emplace(KeyOf(*row), row);
   above.listed = true;
   const QModelIndex parent = SourceIndex(above);
   const int count = m_model->rowCount(parent);
   for (int place = 0; place < count; ++place)
   {
-    auto row = std::make_unique<PanelRow>();
-    row->above = &above;
+    PanelRow* row = Make(above, place);
     const QModelIndex index = m_model->index(place, 0, parent);
     Read(*row, index);
     if (const auto found = known.lower_bound(KeyOf(*row)); found != known.end() && found->first == KeyOf(*row))
     {
-      row = std::move(found->second);
+      m_rows.erase(row);
+      row = found->second;
       known.erase(found);
+      row->place = place;
       row->names.reset();
       Read(*row, index);
     }
-    row->place = place;
-    above.beneath.push_back(std::move(row));
+    above.beneath.push_back(row);
     if (&above == &m_header)
-      List(*above.beneath.back());
+      List(*row);
   }
-  for (auto& [key, row] : known)
-    Leave(std::move(row));
+  for (const auto& [key, row] : known)
+    Leave(row);
   Survey(above);
 }
 

@@ -9,6 +9,7 @@
 
 #include <functional>
 #include <memory>
+#include <unordered_map>
 #include <vector>
 
 namespace SubjectStoreUI
@@ -65,13 +66,16 @@ private:
   void OnGone();
   void Begin() { ++m_changing; }
   void End();
+  /// Ends a change of which it is not known what became of the rows.
+  void Replace();
 
   [[nodiscard]] PanelRow* Find(const QModelIndex& index);
   [[nodiscard]] QModelIndex SourceIndex(const PanelRow& row) const;
   [[nodiscard]] std::vector<PanelRow*> Sortable();
   [[nodiscard]] int SourceRowAt(int row, const QModelIndex& parent) const;
   [[nodiscard]] bool Rearrange(PanelRow& above);
-  void Leave(std::unique_ptr<PanelRow> row);
+  [[nodiscard]] PanelRow* Make(PanelRow& above, int place);
+  void Leave(PanelRow* row);
   void Read(PanelRow& row, const QModelIndex& index) const;
   void ReadNew();
   void List(PanelRow& above);
@@ -82,6 +86,7 @@ private:
   const std::function<void()> m_changed;
   const std::function<void(PanelRow&, const QList<int>&)> m_dataChanged;
   PanelRow m_header;
+  std::unordered_map<const PanelRow*, std::unique_ptr<PanelRow>> m_rows; ///< all but the header
   std::vector<std::unique_ptr<PanelRow>> m_left;
   std::vector<PanelRow*> m_stale;
   std::vector<PanelRow*> m_sorting; ///< whose rows a sort may bring into another order

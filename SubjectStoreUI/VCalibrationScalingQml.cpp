@@ -44,16 +44,16 @@ QStringList VCalibrationScalingQml::markerNames() const
   return names;
 }
 
-bool VCalibrationScalingQml::add(int first, int second)
+VResultGadget VCalibrationScalingQml::add(int first, int second)
 {
   const auto a = static_cast<std::size_t>(first); // of a negative position far past the end
   const auto b = static_cast<std::size_t>(second);
   if (a == b || a >= m_markers.size() || b >= m_markers.size())
-    return false;
+    return {EResult::InvalidArgument, "Two different markers have to be chosen."};
   const double distance =
       std::hypot(m_markers[a].x - m_markers[b].x, m_markers[a].y - m_markers[b].y, m_markers[a].z - m_markers[b].z);
   m_measurements.addMeasurement(tr("Marker %1 to marker %2").arg(first + 1).arg(second + 1), distance);
-  return true;
+  return IResult(EResult::Ok);
 }
 
 bool VCalibrationScalingQml::remove(int row)

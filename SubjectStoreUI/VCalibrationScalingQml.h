@@ -35,9 +35,9 @@ public:
   [[nodiscard]] QStringList markerNames() const;
   [[nodiscard]] double scaleFactor() const { return m_measurements.scaleFactor(); }
 
-  /// Adds a measurement of the distance between two different markers, by their positions in `markerNames`. False for
-  /// others.
-  Q_INVOKABLE bool add(int first, int second);
+  /// Adds a measurement of the distance between two different markers, by their positions in `markerNames`.
+  /// `InvalidArgument` for others.
+  Q_INVOKABLE SubjectStoreUI::VResultGadget add(int first, int second);
   Q_INVOKABLE bool remove(int row);
 
   /// Multiplies the places of the object's markers by the factor. `InvalidValue` unless it is above 0, `Conflict` when

@@ -3,6 +3,7 @@
 #include <QThread>
 
 #include <algorithm>
+#include <set>
 #include <utility>
 
 namespace SubjectStoreUI
@@ -13,45 +14,9 @@ namespace Own = PanelRowsRole;
 namespace
 {
 
-QString KindText(EPanelRow kind)
-{
-  switch (kind)
-  {
-  case EPanelRow::Section:
-    return QStringLiteral("section");
-  case EPanelRow::Subject:
-    return QStringLiteral("subject");
-  case EPanelRow::Child:
-    return QStringLiteral("child");
-  case EPanelRow::Slot:
-    return QStringLiteral("slot");
-  case EPanelRow::Element:
-    return QStringLiteral("element");
-  }
-  return {};
-}
-
 bool IsSecondLevel(const PanelRow& row)
 {
   return row.kind != EPanelRow::Section && row.kind != EPanelRow::Subject;
-}
-
-QList<int> Differences(const PanelRowValues& before, const PanelRowValues& now)
-{
-  QList<int> roles;
-  const auto compare = [&](auto value, int role)
-  {
-    if (before.*value != now.*value)
-      roles.append(role);
-  };
-  compare(&PanelRowValues::expandable, Own::Expandable);
-  compare(&PanelRowValues::expanded, Own::Expanded);
-  compare(&PanelRowValues::count, Own::Count);
-  compare(&PanelRowValues::warnings, Own::WarningCount);
-  compare(&PanelRowValues::element, Own::Element);
-  compare(&PanelRowValues::parentName, Own::ParentName);
-  compare(&PanelRowValues::matchCount, Own::MatchCount);
-  return roles;
 }
 
 }
@@ -173,10 +138,7 @@ void VPanelRowsModel::setSearch(const QString& text)
   m_search = text;
   m_filter.SetSearch(text);
   for (const auto& section : m_sections)
-  {
-    section->closed = false;
-    section->closedSubjects.clear();
-  }
+    section->expansion.StartSearch();
   OnFilterChanged();
   Q_EMIT searchChanged();
 }
@@ -197,50 +159,21 @@ void VPanelRowsModel::OnFilterChanged()
   Refresh();
 }
 
-bool VPanelRowsModel::IsOpen(const Section& section, const PanelRow& row) const
-{
-  if (row.kind == EPanelRow::Section)
-    return !section.collapsed || (m_filter.Searching() && section.matches > 0 && !section.closed);
-  return row.kind == EPanelRow::Subject &&
-         (section.expanded.contains(row.id) || (row.holdsMatch && !section.closedSubjects.contains(row.id)));
-}
-
-void VPanelRowsModel::SetOpen(Section& section, const PanelRow& row, bool open)
-{
-  if (IsSecondLevel(row))
-    return;
-  section.rowsDue = true;
-  if (row.kind == EPanelRow::Section)
-  {
-    section.collapsed = !open;
-    section.closed = !open && m_filter.Searching();
-  }
-  else if (open)
-  {
-    section.expanded.insert(row.id);
-    section.closedSubjects.erase(row.id);
-  }
-  else
-  {
-    section.expanded.erase(row.id);
-    if (m_filter.Searching())
-      section.closedSubjects.insert(row.id);
-  }
-}
-
 void VPanelRowsModel::setExpanded(int row, bool expanded)
 {
   const Place place = At(row);
   if (place.row == nullptr || !place.row->there)
     return;
-  SetOpen(*m_sections[place.section], *place.row, expanded);
+  Section& section = *m_sections[place.section];
+  section.expansion.SetOpen(*place.row, expanded);
+  section.rowsDue = true;
   Refresh();
 }
 
 void VPanelRowsModel::toggle(int row)
 {
   if (const Place place = At(row); place.row != nullptr)
-    setExpanded(row, !IsOpen(*m_sections[place.section], *place.row));
+    setExpanded(row, !m_sections[place.section]->expansion.IsOpen(*place.row));
 }
 
 void VPanelRowsModel::expandAll()
@@ -248,10 +181,11 @@ void VPanelRowsModel::expandAll()
   Refresh();
   for (const auto& section : m_sections)
   {
-    SetOpen(*section, section->mirror.Header(), true);
-    for (const auto& subject : section->mirror.Header().beneath)
+    section->expansion.SetOpen(section->mirror.Header(), true);
+    for (const PanelRow* subject : section->mirror.Header().beneath)
       if (!subject->beneath.empty())
-        SetOpen(*section, *subject, true);
+        section->expansion.SetOpen(*subject, true);
+    section->rowsDue = true;
   }
   Refresh();
 }
@@ -261,10 +195,11 @@ void VPanelRowsModel::collapseAll()
   Refresh();
   for (const auto& section : m_sections)
   {
-    SetOpen(*section, section->mirror.Header(), false);
-    for (const auto& subject : section->mirror.Header().beneath)
-      SetOpen(*section, *subject, false);
-    section->expanded.clear();
+    section->expansion.SetOpen(section->mirror.Header(), false);
+    for (const PanelRow* subject : section->mirror.Header().beneath)
+      section->expansion.SetOpen(*subject, false);
+    section->expansion.CollapseSubjects();
+    section->rowsDue = true;
   }
   Refresh();
 }
@@ -274,9 +209,9 @@ int VPanelRowsModel::rowOfSubject(const VStoreIdGadget& subject)
   Refresh();
   const auto find = [&](const PanelRow& above) -> const PanelRow*
   {
-    for (const auto& row : above.beneath)
+    for (const PanelRow* row : above.beneath)
       if (row->id == subject.Id() && row->passes)
-        return row.get();
+        return row;
     return nullptr;
   };
   if (!subject.Valid())
@@ -285,7 +220,7 @@ int VPanelRowsModel::rowOfSubject(const VStoreIdGadget& subject)
     if (const PanelRow* row = find(section->mirror.Header()))
       return Reveal(*section, *row);
   for (const auto& section : m_sections)
-    for (const auto& above : section->mirror.Header().beneath)
+    for (PanelRow* above : section->mirror.Header().beneath)
       if (const PanelRow* row = above->passes ? find(*above) : nullptr)
         return Reveal(*section, *row);
   return -1;
@@ -294,8 +229,11 @@ int VPanelRowsModel::rowOfSubject(const VStoreIdGadget& subject)
 int VPanelRowsModel::Reveal(Section& section, const PanelRow& row)
 {
   for (const PanelRow* above = row.above; above != nullptr; above = above->above)
-    if (!IsOpen(section, *above))
-      SetOpen(section, *above, true);
+    if (!section.expansion.IsOpen(*above))
+    {
+      section.expansion.SetOpen(*above, true);
+      section.rowsDue = true;
+    }
   if (section.rowsDue)
     Refresh();
   return RowOf(section.position, row);
@@ -359,21 +297,9 @@ void VPanelRowsModel::Refresh()
 
 void VPanelRowsModel::Refresh(Section& section)
 {
-  // What has gone lives on until nobody is told of it any more.
+  // What has gone lives on until everybody has been told.
   const PanelSection::News news = section.mirror.Update();
-  std::vector<PanelRow*> touched;
-  for (PanelRow* row : news.changed)
-    if (PanelRow* subject = IsSecondLevel(*row) ? row->above : row; touched.empty() || touched.back() != subject)
-      touched.push_back(subject);
-  if (std::exchange(section.judgeDue, false) || news.rowsChanged)
-  {
-    section.rowsDue = true;
-    for (const auto& subject : section.mirror.Header().beneath)
-      (void)m_filter.Judge(section.mirror, *subject);
-  }
-  else
-    for (PanelRow* subject : touched)
-      section.rowsDue = m_filter.Judge(section.mirror, *subject) || section.rowsDue;
+  const std::vector<PanelRow*> touched = Judge(section, news);
   std::vector<Change> changes;
   if (std::exchange(section.rowsDue, false))
   {
@@ -386,12 +312,25 @@ void VPanelRowsModel::Refresh(Section& section)
     for (PanelRow* subject : touched)
     {
       Revalue(section, *subject, changes);
-      for (const auto& row : subject->beneath)
+      for (PanelRow* row : subject->beneath)
         Revalue(section, *row, changes);
     }
   Tell(section, changes);
   if (const auto& rows = Rows(section.position); news.tellAll && rows.size() > 1)
     Q_EMIT dataChanged(index(RowOf(section.position, *rows[1])), index(RowOf(section.position, *rows.back())));
+}
+
+std::vector<PanelRow*> VPanelRowsModel::Judge(Section& section, const PanelSection::News& news)
+{
+  std::vector<PanelRow*> touched;
+  for (PanelRow* row : news.changed)
+    if (PanelRow* subject = IsSecondLevel(*row) ? row->above : row; touched.empty() || touched.back() != subject)
+      touched.push_back(subject);
+  const bool all = std::exchange(section.judgeDue, false) || news.rowsChanged;
+  section.rowsDue = section.rowsDue || all;
+  for (PanelRow* subject : all ? section.mirror.Header().beneath : touched)
+    section.rowsDue = m_filter.Judge(section.mirror, *subject) || section.rowsDue;
+  return touched;
 }
 
 void VPanelRowsModel::Count()
@@ -400,8 +339,9 @@ void VPanelRowsModel::Count()
   int shown = 0;
   for (const auto& section : m_sections)
   {
-    total += section->subjects;
-    shown += section->matches;
+    const PanelRow& header = section->mirror.Header();
+    total += header.there ? header.told.count : 0;
+    shown += header.passing;
   }
   if (total == m_totalCount && shown == m_shownCount)
     return;
@@ -413,24 +353,24 @@ void VPanelRowsModel::Count()
 std::vector<PanelRow*> VPanelRowsModel::Wanted(Section& section) const
 {
   PanelRow& header = section.mirror.Header();
-  section.subjects = static_cast<int>(header.beneath.size());
-  section.matches = static_cast<int>(
-      std::count_if(header.beneath.begin(), header.beneath.end(), [](const auto& subject) { return subject->passes; }));
+  header.passing = static_cast<int>(std::count_if(header.beneath.begin(), header.beneath.end(),
+                                                  [](const PanelRow* subject) { return subject->passes; }));
+  header.holdsMatch = m_filter.Searching() && header.passing > 0;
   if (!header.there)
     return {};
   std::vector<PanelRow*> wanted{&header};
-  if (!IsOpen(section, header))
+  if (!section.expansion.IsOpen(header))
     return wanted;
-  for (const auto& subject : header.beneath)
+  for (PanelRow* subject : header.beneath)
   {
     if (!subject->passes)
       continue;
-    wanted.push_back(subject.get());
-    if (!IsOpen(section, *subject))
+    wanted.push_back(subject);
+    if (!section.expansion.IsOpen(*subject))
       continue;
-    for (const auto& row : subject->beneath)
+    for (PanelRow* row : subject->beneath)
       if (row->passes)
-        wanted.push_back(row.get());
+        wanted.push_back(row);
   }
   return wanted;
 }
@@ -441,9 +381,9 @@ PanelRowValues VPanelRowsModel::Values(const Section& section, const PanelRow& r
   values.warnings = row.warnings;
   values.element = row.element;
   values.count = static_cast<int>(row.beneath.size());
-  values.matchCount = row.kind == EPanelRow::Section ? section.matches : row.passing;
+  values.matchCount = row.passing;
   values.expandable = values.matchCount > 0;
-  values.expanded = IsOpen(section, row);
+  values.expanded = section.expansion.IsOpen(row);
   if (IsSecondLevel(row))
     values.parentName = row.above->name;
   return values;

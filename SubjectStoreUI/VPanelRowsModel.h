@@ -1,5 +1,6 @@
 #pragma once
 
+#include "SubjectStoreUI/PanelExpansion.h"
 #include "SubjectStoreUI/PanelFilter.h"
 #include "SubjectStoreUI/PanelRowList.h"
 #include "SubjectStoreUI/PanelRowsRole.h"
@@ -13,7 +14,6 @@
 
 #include <cstddef>
 #include <memory>
-#include <set>
 #include <vector>
 
 namespace SubjectStoreUI
@@ -87,13 +87,7 @@ private:
 
     const std::size_t position;
     PanelSection mirror;
-    bool collapsed = false;
-    std::set<NMX::TSubjectStoreId> expanded;
-    // Closed against the search.
-    bool closed = false;
-    std::set<NMX::TSubjectStoreId> closedSubjects;
-    int subjects = 0;
-    int matches = 0;
+    PanelExpansion expansion;
     bool judgeDue = true;
     bool rowsDue = true;
   };
@@ -108,8 +102,6 @@ private:
   [[nodiscard]] QVariant OwnData(const Place& place, int role) const;
   [[nodiscard]] QModelIndex SourceOf(const QModelIndex& index) const;
 
-  [[nodiscard]] bool IsOpen(const Section& section, const PanelRow& row) const;
-  void SetOpen(Section& section, const PanelRow& row, bool open);
   /// The list's number of a row, after opening what is above it.
   [[nodiscard]] int Reveal(Section& section, const PanelRow& row);
 
@@ -121,6 +113,8 @@ private:
   void Refresh();
   void RefreshLater();
   void Refresh(Section& section);
+  /// Judges what may be judged otherwise now. Answers the subjects of what was read again.
+  std::vector<PanelRow*> Judge(Section& section, const PanelSection::News& news);
   void Count();
   [[nodiscard]] std::vector<PanelRow*> Wanted(Section& section) const;
   [[nodiscard]] PanelRowValues Values(const Section& section, const PanelRow& row) const;

@@ -1,6 +1,7 @@
 #include "SubjectStoreUI/VSubjectPanelQml.h"
 
 #include "HostInterface/ICharacterControls.h"
+#include "HostInterface/IDeviceServices.h"
 #include "HostInterface/ISmartObjectControls.h"
 #include "HostInterface/RunaCorePluginInterface/ICalibrationProvider.h"
 #include "HostInterface/RunaCorePluginInterface/IObjectEvaluationSettings.h"
@@ -379,6 +380,22 @@ VResultGadget VSubjectPanelQml::setAutoPatternManagement(bool on)
 {
   return m_implementation->backend.Edit([&](NMX::IEntryEditor& editor)
                                         { return editor.SetApplicationEntry(Paths::AutoPatternManagement(), on); });
+}
+
+VResultGadget VSubjectPanelQml::rebootDevices(const QStringList& urns)
+{
+  const auto devices = m_implementation->backend.Get(&IPanelServices::Devices);
+  if (!devices)
+    return IResult(EResult::NotAvailable);
+  VResultGadget result = IResult(urns.isEmpty() ? EResult::InvalidArgument : EResult::Ok);
+  for (const QString& urn : urns)
+  {
+    const IResult rebooted = devices->Reboot(urn.toStdString());
+    if (rebooted.Failed() && !result.Failed())
+      result = {rebooted,
+                "\"" + urn.toStdString() + "\" cannot be restarted: " + VResultGadget(rebooted).Reason().toStdString()};
+  }
+  return result;
 }
 
 QVariantList VSubjectPanelQml::candidatesFor(const VSelectionItemGadget& slot) const

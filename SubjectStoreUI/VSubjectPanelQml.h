@@ -32,6 +32,8 @@ class VSubjectPanelQml : public QObject
   Q_PROPERTY(QVariantList selection READ selection NOTIFY selectionChanged)
   /// VStoreIdGadget of the subjects among them.
   Q_PROPERTY(QVariantList selectedSubjects READ selectedSubjects NOTIFY selectionChanged)
+  /// The id of no subject.
+  Q_PROPERTY(SubjectStoreUI::VStoreIdGadget noSubject READ noSubject CONSTANT)
   /// VPanelRowsModel: all sections, one below the other.
   Q_PROPERTY(QAbstractItemModel* rows READ rows CONSTANT)
   /// VDeviceModel.
@@ -53,6 +55,7 @@ public:
 
   [[nodiscard]] QVariantList selection() const;
   [[nodiscard]] QVariantList selectedSubjects() const;
+  [[nodiscard]] VStoreIdGadget noSubject() const { return {}; }
   [[nodiscard]] QAbstractItemModel* rows() const;
   [[nodiscard]] QAbstractItemModel* devices() const;
   [[nodiscard]] VSubjectCalibrationQml* calibration() const;
@@ -100,6 +103,8 @@ public:
   Q_INVOKABLE SubjectStoreUI::VResultGadget setClusterDevice(const SubjectStoreUI::VStoreIdGadget& subject, int cluster,
                                                              const QString& urn);
   Q_INVOKABLE SubjectStoreUI::VResultGadget setAutoPatternManagement(bool on);
+  /// Restarts devices. All are tried; the first failure is the result.
+  Q_INVOKABLE SubjectStoreUI::VResultGadget rebootDevices(const QStringList& urns);
 
   /// The objects that can be put into that slot: an array of {id, name}, in the order of their names.
   Q_INVOKABLE [[nodiscard]] QVariantList candidatesFor(const SubjectStoreUI::VSelectionItemGadget& slot) const;

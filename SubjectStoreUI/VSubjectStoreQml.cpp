@@ -1,7 +1,6 @@
 #include "SubjectStoreUI/VSubjectStoreQml.h"
 
 #include "HostInterface/ICharacterControls.h"
-#include "HostInterface/IDeviceServices.h"
 #include "HostInterface/ISmartObjectControls.h"
 #include "HostInterface/RunaCorePluginInterface/IObjectEvaluationSettings.h"
 #include "HostInterface/RunaCorePluginInterface/IPluginSettings.h"
@@ -270,26 +269,17 @@ VResultGadget VSubjectStoreQml::toggleSubjectsEnabled(const QVariantList& i_Subj
 
 VResultGadget VSubjectStoreQml::rebootSubjects(const QVariantList& i_SubjectStoreIds)
 {
-  const auto devices = m_implementation->backend.Get(&IPanelServices::Devices);
-  if (!devices)
-    return IResult(EResult::NotAvailable);
-  IResult result = EResult::InvalidArgument; // until there is a device
-  std::string reason;
+  QStringList urns;
   for (const TSubjectStoreId id : ToIds(i_SubjectStoreIds))
   {
     const auto clusters = m_implementation->backend.Entry<Clusters>(id, Paths::SmartClusters()).value_or(Clusters{});
     for (const NMX::SmartCluster& cluster : clusters)
-    {
-      if (cluster.deviceUrn.empty())
-        continue;
-      const IResult rebooted = devices->Reboot(cluster.deviceUrn);
-      if (rebooted.Failed() && reason.empty())
-        reason = "\"" + cluster.deviceUrn + "\" cannot be restarted: " + VResultGadget(rebooted).Reason().toStdString();
-      if (result.Succeeded() || result == EResult::InvalidArgument)
-        result = rebooted;
-    }
+      if (!cluster.deviceUrn.empty())
+        urns.append(QString::fromStdString(cluster.deviceUrn));
   }
-  return {result, result == EResult::InvalidArgument ? "No device is linked to what is selected." : reason};
+  if (urns.isEmpty())
+    return {EResult::InvalidArgument, "No device is linked to what is selected."};
+  return m_implementation->panel->rebootDevices(urns);
 }
 
 VResultGadget VSubjectStoreQml::removeSubjects(const QVariantList& i_SubjectStoreIds, bool i_bRemoveChildren)

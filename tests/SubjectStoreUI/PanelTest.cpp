@@ -466,8 +466,8 @@ TEST_F(PanelTest, AnObjectIsScaledToWhatWasMeasured)
   ASSERT_NE(operation, nullptr);
   EXPECT_EQ(operation->markerNames(), QStringList({"Marker 1", "Marker 2"}));
   for (const auto& [first, second] : {std::pair(0, 0), {-1, 0}, {0, 2}})
-    EXPECT_FALSE(operation->add(first, second));
-  EXPECT_TRUE(operation->add(0, 1));
+    EXPECT_EQ(operation->add(first, second).Name(), "InvalidArgument");
+  EXPECT_FALSE(operation->add(0, 1).Failed());
   EXPECT_EQ(operation->apply().Name(), "InvalidValue") << "nothing has been measured";
   EXPECT_TRUE(operation->measurements()->setData(operation->measurements()->index(0, 2), 10));
   EXPECT_EQ(operation->scaleFactor(), 2);
