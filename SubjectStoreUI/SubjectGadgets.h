@@ -26,6 +26,8 @@ public:
   [[nodiscard]] NMX::TSubjectStoreId Id() const { return m_id; }
   [[nodiscard]] bool Valid() const { return m_id.Valid(); }
   Q_INVOKABLE [[nodiscard]] QString toString() const { return QString::number(m_id.Value()); }
+  /// One of its own. What QML reads from a row of a model is no value but a way to the row's value, which may go.
+  Q_INVOKABLE [[nodiscard]] SubjectStoreUI::VStoreIdGadget copy() const { return *this; }
   Q_INVOKABLE [[nodiscard]] bool equals(const SubjectStoreUI::VStoreIdGadget& other) const
   {
     return m_id == other.m_id;
@@ -55,6 +57,7 @@ public:
   [[nodiscard]] VStoreIdGadget Subject() const { return VStoreIdGadget(m_item.subject); }
   [[nodiscard]] int Slot() const { return m_item.slot; }
   [[nodiscard]] QString Device() const { return QString::fromStdString(m_item.device); }
+  Q_INVOKABLE [[nodiscard]] SubjectStoreUI::VSelectionItemGadget copy() const { return *this; }
   Q_INVOKABLE [[nodiscard]] bool equals(const SubjectStoreUI::VSelectionItemGadget& other) const
   {
     return *this == other;

@@ -27,6 +27,8 @@ QtObject {
     readonly property color text: dark ? "#e6e9ee" : "#1b1f24"
     readonly property color secondaryText: dark ? "#a3acb9" : "#566070"
     readonly property color disabledText: dark ? "#6d7683" : "#9aa3af"
+    readonly property color selected: dark ? "#2f4a70" : "#cfe0f9"
+    readonly property color selectedInactive: dark ? "#3a414d" : "#e0e4ea"
     readonly property color highlight: dark ? "#3d7bd9" : "#2563c4"
     readonly property color highlightedText: "#ffffff"
 
@@ -43,7 +45,19 @@ QtObject {
     readonly property real rowHeight: Math.round(metrics.height * 1.6)
     readonly property real indentation: 4 * unit
     readonly property real radius: unit / 2
+    readonly property real smallFont: Math.round(metrics.font.pixelSize * 0.88)
     readonly property real iconSize: Math.round(metrics.height)
+
+    /// Where the names of subjects begin in their rows, and what is beneath them.
+    readonly property real nameMargin: Math.round(2 * unit + 2 * (iconSize + spacing) + 0.7 * iconSize + spacing)
+    /// What rows keep free at their ends for warnings.
+    readonly property real badgeWidth: Math.round(iconSize + 3 * unit)
+
+    /// Of a choice in a palette.
+    readonly property real cellSize: Math.round(rowHeight + 1.5 * unit)
+
+    /// In ms, before a tooltip appears.
+    readonly property int tipDelay: 600
 
     /// One of 64 colours that neighbours of which differ; for active marker patterns. 0, no pattern, is grey.
     function patternColour(pattern: int): color {

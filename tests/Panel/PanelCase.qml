@@ -1,0 +1,140 @@
+import QtQuick
+import QtQuick.Controls
+import QtTest
+import Tavix.SubjectStore
+import Tavix.SubjectStore.Panel
+
+/// A test of the panel: an empty stage before each function, and the ways in which an operator finds things by what
+/// they are called. A warning fails the test.
+TestCase {
+    id: test
+
+    property alias view: subject
+    readonly property var panel: subject.panel
+    readonly property var rows: panel.rows
+    readonly property Item list: find(item => item.reveal !== undefined && item.rows !== undefined, subject)
+
+    when: windowShown
+    visible: true
+    width: 1100
+    height: 760
+
+    SubjectPanel {
+        id: subject
+
+        anchors.fill: parent
+    }
+
+    function init() {
+        failOnWarning(/.?/)
+        stage.clear()
+        panel.select([])
+        rows.search = ""
+        rows.onlyWarnings = false
+        tryVerify(() => rows.totalCount === 0)
+        mouseMove(subject, 1, 1)
+        list.forceActiveFocus()
+    }
+
+    /// The first visible item beneath `root` that is accepted; of popups too when `root` is left out.
+    function find(accept: var, root: var): Item {
+        const top = root ?? subject.Window.contentItem
+        if (!top.visible)
+            return null
+        for (let i = top.children.length - 1; i >= 0; --i) {
+            const found = find(accept, top.children[i])
+            if (found)
+                return found
+        }
+        return accept(top) ? top : null
+    }
+
+    /// Waits for what has that text; buttons, menu lines, labels.
+    function byText(text: string): Item {
+        let found = null
+        tryVerify(() => (found = find(item => item.text === text && item.width > 0 && item.height > 0)) !== null, 3000, text)
+        return found
+    }
+
+    /// Waits for what has that accessible name.
+    function byName(name: string): Item {
+        let found = null
+        tryVerify(() => (found = find(item => item.Accessible.name === name && item.width > 0)) !== null, 3000, name)
+        return found
+    }
+
+    function gone(text: string): bool {
+        return find(item => item.text === text && item.width > 0 && item.height > 0) === null
+    }
+
+    function press(item: Item, button: var, modifiers: var) {
+        mouseClick(item, item.width / 2, item.height / 2, button ?? Qt.LeftButton, modifiers ?? Qt.NoModifier)
+    }
+
+    function idOf(name: string): var {
+        return SubjectStore.subjects().find(id => SubjectStore.subjectName(id) === name)
+    }
+
+    /// The row of a subject, in view.
+    function rowOf(name: string): Item {
+        let found = null
+        tryVerify(() => {
+            const id = idOf(name)
+            const row = id ? rows.rowOfSubject(id) : -1
+            if (row < 0)
+                return false
+            list.positionViewAtIndex(row, ListView.Contain)
+            found = list.itemAtIndex(row)
+            return found !== null && found.subjectName === name
+        }, 3000, "row of " + name)
+        return found
+    }
+
+    /// The row beneath a subject whose slot, or element, has that name.
+    function rowBeneath(name: string, beneath: string): Item {
+        const row = rows.rowOfSubject(idOf(name))
+        rows.setExpanded(row, true)
+        let found = null
+        tryVerify(() => {
+            for (let i = row + 1; i < list.count; ++i) {
+                list.positionViewAtIndex(i, ListView.Contain)
+                const item = list.itemAtIndex(i)
+                if (!item || item.depth < 2)
+                    return false
+                if (item.slotName === beneath || item.subjectName === beneath) {
+                    found = item
+                    return true
+                }
+            }
+            return false
+        }, 3000, beneath + " beneath " + name)
+        return found
+    }
+
+    /// Clicks rows of subjects: the first alone, the others in addition.
+    function select(...names) {
+        names.forEach((name, i) => press(rowOf(name), Qt.LeftButton, i === 0 ? Qt.NoModifier : Qt.ControlModifier))
+        compare(panel.selectedSubjects.length, names.length)
+    }
+
+    /// Opens the row's menu and goes through it to a command.
+    function choose(row: Item, ...texts) {
+        press(row, Qt.RightButton)
+        for (const text of texts) {
+            const line = byText(text)
+            verify(line.enabled, text + " is enabled")
+            press(line)
+        }
+    }
+
+    function type(text: string) {
+        for (const letter of text)
+            keyClick(letter)
+    }
+
+    /// Shows a page of the inspector.
+    function showPage(name: string) {
+        const inspector = find(item => item.pages !== undefined && item.show !== undefined)
+        inspector.show(name)
+    }
+}
