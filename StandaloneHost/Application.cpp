@@ -6,22 +6,33 @@
 #include "StandaloneHost/Calibration/VCalibrationProvider.h"
 #include "StandaloneHost/Characters/VCharacterControls.h"
 #include "StandaloneHost/Evaluation/VObjectEvaluationEngine.h"
+#include "StandaloneHost/FileIO/VRunaCoreFileIO.h"
 #include "StandaloneHost/Files/SubjectConfiguration.h"
+#include "StandaloneHost/Panel/VObjectPresetProvider.h"
+#include "StandaloneHost/Panel/VOfflineStoreServices.h"
+#include "StandaloneHost/Panel/VPanelServices.h"
+#include "StandaloneHost/Panel/VSelectionManager.h"
 #include "StandaloneHost/PluginModule.h"
 #include "StandaloneHost/Postal/VAsioPostalService.h"
+#include "StandaloneHost/Postal/VGuiPostalService.h"
 #include "StandaloneHost/Server/VServer.h"
 #include "StandaloneHost/Settings/PanelSettings.h"
 #include "StandaloneHost/Simulation/HostSimulation.h"
+#include "StandaloneHost/Simulation/VDeviceServices.h"
 #include "StandaloneHost/SmartObjects/AutoPatternManagement.h"
 #include "StandaloneHost/SmartObjects/VSmartObjectControls.h"
+#include "StandaloneHost/StopSignals.h"
 #include "StandaloneHost/Store/SqliteArchive.h"
 #include "StandaloneHost/Store/VStore.h"
 #include "StandaloneHost/VFileLocations.h"
 #include "StandaloneHost/VPluginHost.h"
+#include "StandaloneHost/Window/Display.h"
+#include "StandaloneHost/Window/LogFeed.h"
+#include "StandaloneHost/Window/VWindow.h"
 
-#include <csignal>
 #include <cstdio>
 #include <fstream>
+#include <optional>
 #include <system_error>
 #include <unistd.h>
 
@@ -92,16 +103,6 @@ void WriteReadyFile(const std::filesystem::path& file, const std::string& addres
   std::filesystem::rename(unfinished, file);
 }
 
-void WaitForSignal()
-{
-  sigset_t signals;
-  sigemptyset(&signals);
-  sigaddset(&signals, SIGINT);
-  sigaddset(&signals, SIGTERM);
-  int received = 0;
-  sigwait(&signals, &received);
-}
-
 /// Object evaluation, if the feature is switched on.
 std::shared_ptr<Evaluation::VObjectEvaluationEngine> StartEvaluation(const std::shared_ptr<Store::VStore>& store,
                                                                      const Options& options)
@@ -111,65 +112,149 @@ std::shared_ptr<Evaluation::VObjectEvaluationEngine> StartEvaluation(const std::
   return NMX::MakeShared<Evaluation::VObjectEvaluationEngine>(store);
 }
 
-/// The order matters: clients go first, then what serves them, then the plugin, and the store last.
-void Stop(Server::VServer& server, Characters::VCharacterControls& characters,
-          Calibration::VCalibrationProvider& calibration, Postal::VAsioPostalService& postal,
-          Evaluation::VObjectEvaluationEngine* evaluation, PluginPointer plugin, std::shared_ptr<Store::VStore> store)
+/// What runs until the host stops.
+struct Parts
 {
-  server.Close();    // no client, no outstanding call, no function any more
-  characters.Stop(); // the timers that would keep the postal service busy are gone
-  calibration.Stop();
-  postal.Stop(); // the strands have run empty
-  if (evaluation != nullptr)
-    evaluation->Stop(); // nobody edits the store any more
-  plugin->UnregisterQml();
-  plugin.reset();
-  store.reset();
+  std::shared_ptr<Store::VStore> store;
+  PluginPointer plugin;
+  std::shared_ptr<Postal::VAsioPostalService> postal;
+  std::shared_ptr<Postal::VGuiPostalService> gui;
+  std::shared_ptr<Server::VServer> server;
+  std::shared_ptr<Evaluation::VObjectEvaluationEngine> evaluation; // none when the feature is off
+  std::shared_ptr<Characters::VCharacterControls> characters;
+  std::shared_ptr<Calibration::VCalibrationProvider> calibration;
+  std::shared_ptr<Simulation::VDeviceServices> devices;
+  std::shared_ptr<SmartObjects::DeviceLayouts> layouts;
+  std::shared_ptr<SmartObjects::VSmartObjectControls> smartObjects;
+  std::shared_ptr<VFileLocations> locations;
+  std::unique_ptr<Window::VWindow> window; // none when headless
+};
+
+/// Opens the store, loads the plugin and makes the services.
+Parts MakeParts(const Options& options)
+{
+  Parts parts;
+  const auto& store = parts.store = OpenStore(options);
+  LoadConfigurations(*store, options);
+  parts.locations = std::make_shared<VFileLocations>(options.dataFolder);
+  SetUpSettings(*store, *parts.locations);
+  parts.plugin = LoadPlugin(options.pluginFile.empty() ? OwnPluginFile() : options.pluginFile);
+  const auto& postal = parts.postal = NMX::MakeShared<Postal::VAsioPostalService>();
+  parts.gui = std::make_shared<Postal::VGuiPostalService>();
+  parts.server = NMX::MakeShared<Server::VServer>(postal, options.server);
+  parts.evaluation = StartEvaluation(store, options);
+  parts.layouts = std::make_shared<SmartObjects::DeviceLayouts>();
+  parts.smartObjects = std::make_shared<SmartObjects::VSmartObjectControls>(store, parts.layouts);
+  parts.characters = std::make_shared<Characters::VCharacterControls>(store, postal, options.characterCalibrationTime);
+  parts.calibration =
+      std::make_shared<Calibration::VCalibrationProvider>(store, postal, options.subjectCalibrationTimes);
+  parts.devices = std::make_shared<Simulation::VDeviceServices>(store, postal);
+  return parts;
+}
+
+/// The host as the plugin sees it.
+HostServices ServicesOf(const Parts& parts, const Options& options)
+{
+  const auto settings = std::make_shared<VPluginSettings>(
+      options.features, HostSettings{parts.locations, parts.smartObjects, parts.evaluation, parts.characters});
+  std::shared_ptr<RunaCorePluginInterface::IFeatures> features;
+  settings->Features(features);
+  HostServices services;
+  services.store = parts.store;
+  services.notificationPostal = parts.postal;
+  services.server = parts.server;
+  services.settings = settings;
+  services.deviceLayouts = parts.layouts;
+  services.calibration = parts.calibration;
+  services.accessRights = std::make_shared<OpenToAll>();
+  services.guiPostal = parts.gui;
+  services.fileIO = std::make_shared<FileIO::VRunaCoreFileIO>(parts.store);
+  services.selection = std::make_shared<Panel::VSelectionManager>();
+  services.panel = std::make_shared<Panel::VPanelServices>(
+      Panel::ServicesForPanel{features, services.fileIO, parts.locations, parts.evaluation, parts.smartObjects,
+                              parts.characters, parts.devices, parts.calibration});
+  services.objectPresets = std::make_shared<Panel::VObjectPresetProvider>();
+  services.offlineStore = std::make_shared<Panel::VOfflineStoreServices>(parts.store, parts.gui);
+  return services;
+}
+
+/// The order matters: clients go first, then what serves them, then the window, then the plugin, and the store last.
+void Stop(Parts& parts)
+{
+  parts.server->Close();    // no client, no outstanding call, no function any more
+  parts.characters->Stop(); // the timers that would keep the postal service busy are gone
+  parts.calibration->Stop();
+  parts.devices->Stop();
+  parts.postal->Stop(); // the strands have run empty
+  if (parts.evaluation)
+    parts.evaluation->Stop(); // nobody edits the store any more
+  parts.gui->Stop();          // nobody tells the window of anything
+  parts.window.reset();       // with the QML engine, which uses objects of the plugin
+  parts.plugin->UnregisterQml();
+  parts.plugin.reset();
+  parts.store.reset();
+}
+
+/// What the plugin has for the window.
+void RegisterWith(Window::VWindow& window, RunaCorePluginInterface::IPlugin& plugin, VPluginHost& host)
+{
+  (void)plugin.RegisterQml(host, window);
+  (void)plugin.RegisterUserInterface(host, window);
+}
+
+/// Tells whoever started the host that calls are served.
+void AnnounceAddress(const Options& options, const std::string& address)
+{
+  WriteReadyFile(options.readyFile, address);
+  std::printf("listening on http://%s and ws://%s/rpc\n", address.c_str(), address.c_str());
+  std::fflush(stdout);
+}
+
+/// Registers everything, opens the server and runs until somebody ends the program.
+void Run(Parts& parts, const Options& options, Window::VLogModel* log)
+{
+  // What follows the store's changes has strands of its own.
+  const auto makeStrand = [&] { return NMX::MakeShared<NotificationSystem::VAsioPostalServiceStrand>(parts.postal); };
+  const auto patternStrand = makeStrand();
+  const auto calibrationStrand = makeStrand();
+  VPluginHost host(ServicesOf(parts, options));
+  (void)parts.plugin->RegisterServices(host);
+  Simulation::RegisterGroup(*parts.server, parts.store, makeStrand());
+  if (log != nullptr)
+  {
+    parts.window = std::make_unique<Window::VWindow>(*log, options.dataFolder);
+    RegisterWith(*parts.window, *parts.plugin, host);
+  }
+  parts.plugin->RegistrationFinished();
+  const auto patternManagement = SmartObjects::ManagePatterns(parts.store, parts.smartObjects, patternStrand);
+  parts.calibration->Open(calibrationStrand);
+  parts.server->Open();
+  if (parts.window)
+    parts.window->Show(*parts.server, [&plugin = *parts.plugin] { return plugin.CanClose(); });
+  AnnounceAddress(options, parts.server->Address());
+  QCoreApplication::exec();
 }
 
 }
 
 void RunApplication(const Options& options)
 {
-  auto store = OpenStore(options);
-  LoadConfigurations(*store, options);
-  const auto locations = std::make_shared<VFileLocations>(options.dataFolder);
-  SetUpSettings(*store, *locations);
-  PluginPointer plugin = LoadPlugin(options.pluginFile.empty() ? OwnPluginFile() : options.pluginFile);
-
-  const auto postal = NMX::MakeShared<Postal::VAsioPostalService>();
-  const auto server = NMX::MakeShared<Server::VServer>(postal, options.server);
-  const auto evaluation = StartEvaluation(store, options);
-  const auto layouts = std::make_shared<SmartObjects::DeviceLayouts>();
-  const auto smartObjects = std::make_shared<SmartObjects::VSmartObjectControls>(store, layouts);
-  const auto characters =
-      std::make_shared<Characters::VCharacterControls>(store, postal, options.characterCalibrationTime);
-  const auto calibration =
-      std::make_shared<Calibration::VCalibrationProvider>(store, postal, options.subjectCalibrationTimes);
-  // What follows the store's changes has strands of its own.
-  const auto patternStrand = NMX::MakeShared<NotificationSystem::VAsioPostalServiceStrand>(postal);
-  const auto calibrationStrand = NMX::MakeShared<NotificationSystem::VAsioPostalServiceStrand>(postal);
-  std::shared_ptr<const void> patternManagement;
+  const bool withWindow = !options.headless && Window::HasDisplay();
+  const auto eventLoop = Window::MakeEventLoop(withWindow);
+  const StopSignals signals;
+  Window::VLogModel log;
+  std::optional<Window::LogFeed> logFeed;
+  if (withWindow)
+    logFeed.emplace(log);
+  Parts parts = MakeParts(options);
   try
   {
-    const auto settings = std::make_shared<VPluginSettings>(
-        options.features, HostSettings{locations, smartObjects, evaluation, characters});
-    VPluginHost host({store, postal, server, settings, layouts, calibration, std::make_shared<OpenToAll>()});
-    (void)plugin->RegisterServices(host);
-    Simulation::RegisterGroup(*server, store, NMX::MakeShared<NotificationSystem::VAsioPostalServiceStrand>(postal));
-    plugin->RegistrationFinished();
-    patternManagement = SmartObjects::ManagePatterns(store, smartObjects, patternStrand);
-    calibration->Open(calibrationStrand);
-    server->Open();
-    WriteReadyFile(options.readyFile, server->Address());
-    std::printf("listening on http://%s and ws://%s/rpc\n", server->Address().c_str(), server->Address().c_str());
-    std::fflush(stdout);
-    WaitForSignal();
+    Run(parts, options, withWindow ? &log : nullptr);
   }
   catch (...)
   {
-    Stop(*server, *characters, *calibration, *postal, evaluation.get(), std::move(plugin), std::move(store));
+    Stop(parts);
     throw;
   }
-  Stop(*server, *characters, *calibration, *postal, evaluation.get(), std::move(plugin), std::move(store));
+  Stop(parts);
 }

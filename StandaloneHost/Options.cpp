@@ -125,7 +125,7 @@ po::options_description Description()
       ("t-pose-time", text("60000"), "how long a subject calibration waits for the T-pose, in ms") //
       ("subject-calibration-time", text("10000"),
        "how long a subject calibration goes on after the T-pose, in ms")                           //
-      ("headless", "no window")                                                                    //
+      ("headless", "no window; also the case when there is no display")                            //
       ("ready-file", po::value<std::string>(), "file to write once calls are served")              //
       ("plugin-file", po::value<std::string>(), "plugin module to load (default: the host's own)") //
       ("log", text("notice"), "error, warning, notice, info, debug or trace");

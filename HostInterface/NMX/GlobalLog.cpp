@@ -3,6 +3,7 @@
 #include <array>
 #include <cstdio>
 #include <mutex>
+#include <utility>
 
 namespace NMX
 {
@@ -35,10 +36,10 @@ GlobalLog::Sink& CurrentSink()
 
 }
 
-void GlobalLog::SetSink(Sink sink)
+GlobalLog::Sink GlobalLog::SetSink(Sink sink)
 {
   const std::lock_guard lock(SinkMutex());
-  CurrentSink() = sink ? std::move(sink) : Sink{&WriteToStandardError};
+  return std::exchange(CurrentSink(), sink ? std::move(sink) : Sink{&WriteToStandardError});
 }
 
 void GlobalLog::SetLevel(ESeverity newLevel)

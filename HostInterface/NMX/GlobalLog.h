@@ -40,9 +40,9 @@ class GlobalLog
 public:
   using Sink = std::function<void(const LogRecord&)>;
 
-  /// Replaces the sink, which starts as one line on standard error for each message. The sink is never called by two
-  /// threads at once and must not log.
-  static void SetSink(Sink sink);
+  /// Replaces the sink, which starts as one line on standard error for each message (an empty one is that again), and
+  /// answers the one before. The sink is never called by two threads at once and must not log.
+  static Sink SetSink(Sink sink);
 
   static void SetLevel(ESeverity level);
 

@@ -125,9 +125,9 @@ IResult Merge(NMX::IEntryEditor& editor, std::span<const TSubjectStoreId> object
 
 IResult CheckSplit(const NMX::IStoreReader& access, std::span<const TSubjectStoreId> objects)
 {
-  const bool any =
-      std::any_of(objects.begin(), objects.end(), [&](TSubjectStoreId id) { return ClusterCount(access, id) > 1; });
-  return any && AllSmart(access, objects) ? EResult::Ok : EResult::InvalidArgument;
+  const auto hasMore = [&](TSubjectStoreId id) { return ClusterCount(access, id) > 1; };
+  return AllSmart(access, objects) && std::any_of(objects.begin(), objects.end(), hasMore) ? EResult::Ok
+                                                                                           : EResult::InvalidArgument;
 }
 
 IResult Split(NMX::IEntryEditor& editor, std::span<const TSubjectStoreId> objects)

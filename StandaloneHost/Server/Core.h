@@ -4,6 +4,7 @@
 #include "StandaloneHost/Server/Notifier.h"
 #include "StandaloneHost/Server/VServer.h"
 
+#include <atomic>
 #include <chrono>
 #include <cstdint>
 #include <memory>
@@ -36,9 +37,18 @@ protected:
 class Connections
 {
 public:
-  void Add(IConnection& connection) { m_connections.insert(&connection); }
-  void Remove(IConnection& connection) { m_connections.erase(&connection); }
-  [[nodiscard]] std::size_t Count() const { return m_connections.size(); }
+  void Add(IConnection& connection)
+  {
+    m_connections.insert(&connection);
+    m_count.store(m_connections.size(), std::memory_order_relaxed);
+  }
+  void Remove(IConnection& connection)
+  {
+    m_connections.erase(&connection);
+    m_count.store(m_connections.size(), std::memory_order_relaxed);
+  }
+  /// [any]
+  [[nodiscard]] std::size_t Count() const { return m_count.load(std::memory_order_relaxed); }
 
   /// Calls `step` for each; a connection may end meanwhile.
   template <class Step>
@@ -55,6 +65,7 @@ public:
 
 private:
   std::unordered_set<IConnection*> m_connections;
+  std::atomic<std::size_t> m_count{0};
 };
 
 /// What the connections of a server share. [server]

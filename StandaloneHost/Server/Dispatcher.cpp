@@ -186,6 +186,7 @@ std::size_t Dispatcher::Handle(std::string_view text, IListener* listener, Answe
     return 1;
   }
   const std::size_t calls = message.requests.size();
+  m_calls.store(Calls() + calls, std::memory_order_relaxed); // nobody else writes it
   if (!message.batch)
   {
     HandleRequest(message.requests.front(), listener, std::move(answer));

@@ -4,6 +4,8 @@
 #include "StandaloneHost/Server/Notifier.h"
 #include "StandaloneHost/Server/Registry.h"
 
+#include <atomic>
+#include <cstdint>
 #include <functional>
 #include <memory>
 #include <string>
@@ -27,6 +29,9 @@ public:
   /// as one that can be told of changes; null when its transport cannot. Returns how many calls were begun.
   std::size_t Handle(std::string_view text, IListener* listener, Answer answer);
 
+  /// How many calls have been begun. [any]
+  [[nodiscard]] std::uint64_t Calls() const { return m_calls.load(std::memory_order_relaxed); }
+
   /// The greeting for a new client.
   [[nodiscard]] std::string Hello(std::uint64_t session) const;
 
@@ -45,6 +50,7 @@ private:
   const TerminalServer2::Level m_grantedLevel;
   const std::string m_epoch;
   mutable std::string m_description; // made when first asked for
+  std::atomic<std::uint64_t> m_calls{0};
 };
 
 }

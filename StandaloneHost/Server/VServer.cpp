@@ -233,4 +233,9 @@ unsigned short VServer::Port() const
   return m_state->port;
 }
 
+ServerTraffic VServer::Traffic() const
+{
+  return {m_state->core->connections.Count(), m_state->core->dispatcher.Calls()};
+}
+
 }

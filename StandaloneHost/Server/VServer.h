@@ -5,6 +5,8 @@
 #include "HostInterface/TerminalServer2/IServer.h"
 #include "StandaloneHost/Server/Limits.h"
 
+#include <cstddef>
+#include <cstdint>
 #include <memory>
 #include <stdexcept>
 #include <string>
@@ -28,6 +30,13 @@ struct ServerOptions
   std::string token;                       ///< clients must present it, unless empty
   std::vector<std::string> allowedOrigins; ///< of web pages, beside the server's own
   Limits limits;
+};
+
+/// What a server has to do.
+struct ServerTraffic
+{
+  std::size_t connections = 0; ///< open now
+  std::uint64_t calls = 0;     ///< since it opened
 };
 
 /// The standalone host's remote-procedure server: JSON-RPC 2.0 over HTTP and WebSocket on one port. What is registered
@@ -55,6 +64,9 @@ public:
   /// Where it is reached, such as "127.0.0.1:8420". Valid once it is open.
   [[nodiscard]] const std::string& Address() const;
   [[nodiscard]] unsigned short Port() const;
+
+  /// [any]
+  [[nodiscard]] ServerTraffic Traffic() const;
 
 private:
   struct State;

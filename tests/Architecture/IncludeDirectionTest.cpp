@@ -52,6 +52,7 @@ const std::map<std::string, std::set<std::string>> allowed{
     {"StandaloneHost/Postal", {"HostInterface"}},
     {"StandaloneHost/Server", {"HostInterface"}},
     {"StandaloneHost/Simulation", {"HostInterface", "StoreInterface"}},
+    {"StandaloneHost/Window", {"StandaloneHost/Server", "HostInterface"}},
     {"StandaloneHost/Files", {"StandaloneHost/Store", "HostInterface", "StoreInterface"}},
     {"StandaloneHost/Settings", {"StandaloneHost/Store", "HostInterface", "StoreInterface"}},
     {"StandaloneHost/Calibration", {"StandaloneHost/Files", "StandaloneHost/Store", "HostInterface", "StoreInterface"}},
@@ -66,7 +67,7 @@ const std::map<std::string, std::set<std::string>> allowed{
      {"StandaloneHost/FileIO", "StandaloneHost/Panel", "StandaloneHost/Store", "StandaloneHost/Postal",
       "StandaloneHost/Server", "StandaloneHost/Files", "StandaloneHost/Calibration", "StandaloneHost/Settings",
       "StandaloneHost/Characters", "StandaloneHost/Evaluation", "StandaloneHost/Simulation",
-      "StandaloneHost/SmartObjects", "HostInterface", "StoreInterface"}},
+      "StandaloneHost/SmartObjects", "StandaloneHost/Window", "HostInterface", "StoreInterface"}},
 };
 
 /// The folder of `allowed` that a file belongs to: the deepest that its path begins with.

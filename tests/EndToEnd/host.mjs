@@ -112,8 +112,10 @@ export function configuration(subjects, devices = []) {
           '</SubjectConfiguration>', ''].join('\n');
 }
 
-function launch(options) {
-  const child = spawn(binary, options, { stdio: ['ignore', 'pipe', 'pipe'] });
+// Without a window, whatever the display, unless an environment is given.
+function launch(options, environment) {
+  const child = spawn(binary, environment ? options : ['--headless', ...options],
+                      { stdio: ['ignore', 'pipe', 'pipe'], env: environment });
   running.add(child);
   const process = { child, stderr: '' };
   process.listening = new Promise(done => child.stdout.setEncoding('utf8').on('data', text => {
@@ -137,8 +139,8 @@ function assertNoSanitizerReport(stderr) {
 }
 
 // Runs the host with options that keep it from starting.
-export async function refusedStart(options) {
-  const process = launch(['--headless', ...options]);
+export async function refusedStart(options, environment) {
+  const process = launch(options, environment);
   try {
     const { status, signal } = await inTime(Promise.race([process.ended, process.listening]),
                                             `${options.join(' ')} ends the host`, 10000);
@@ -182,8 +184,8 @@ class Host {
     await this.#process.ended;
   }
 
-  async assertEndsWell() {
-    const status = await this.stop();
+  async assertEndsWell(signal = 'SIGTERM') {
+    const status = await this.stop(signal);
     if (!this.#killed)
       assert.equal(status, 0, `exit status of the host\n${this.stderr}`);
     assertNoSanitizerReport(this.stderr);
@@ -191,14 +193,14 @@ class Host {
 }
 
 // Starts a host and waits until it serves calls. `subjects` with `devices`, or `config` (a text) fill an empty
-// store.
+// store. `environment` takes the place of the environment; only with one may the host have a window.
 export async function startHost({ subjects, devices, config, data = ':memory:', listen = '127.0.0.1:0',
-                                  options = [] } = {}) {
+                                  options = [], environment } = {}) {
   const readyFile = join(temporaryDirectory(), 'ready.json');
   const text = subjects ? configuration(subjects, devices) : config;
   const configurationOptions = text === undefined ? [] : ['--config', temporaryFile('stage.xml', text)];
-  const process = launch(['--headless', '--listen', listen, '--data', data, '--ready-file', readyFile,
-                          ...configurationOptions, ...options]);
+  const process = launch(['--listen', listen, '--data', data, '--ready-file', readyFile, ...configurationOptions,
+                          ...options], environment);
   let ended;
   process.ended.then(how => { ended = how; }, failure => { ended = failure; });
   const deadline = Date.now() + scaled(15000);

@@ -117,14 +117,22 @@ TestCase {
         compare(panel.selectedSubjects.length, names.length)
     }
 
+    /// The line of an open menu.
+    function lineOf(text: string): Item {
+        return find(item => item.subMenu !== undefined && item.text === text && item.height > 0)
+    }
+
     /// Opens the row's menu and goes through it to a command.
     function choose(row: Item, ...texts) {
         press(row, Qt.RightButton)
         for (const text of texts) {
-            const line = byText(text)
+            let line = null
+            tryVerify(() => (line = lineOf(text)) !== null, 3000, text)
             verify(line.enabled, text + " is enabled")
+            wait(50) // the menu is laid out
             press(line)
         }
+        tryVerify(() => lineOf(texts[0]) === null, 3000, "the menu closes")
     }
 
     function type(text: string) {

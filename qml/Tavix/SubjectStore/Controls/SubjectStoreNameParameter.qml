@@ -22,7 +22,7 @@ Column {
         if (name === (control.parameter.value || "") || (!control.subject && name === ""))
             return ""
         if (control.panel)
-            return control.panel.nameProblem(name, control.subject || control.panel.itemOfDevice("").subject)
+            return control.panel.nameProblem(name, control.subject || control.panel.noSubject)
         return SubjectStore.isSubjectNameInUse(name) ? qsTr("There is a subject with this name.") : ""
     }
 

@@ -1,5 +1,4 @@
 import QtQuick
-import QtQuick.Controls
 import Tavix.SubjectStore
 
 /// What can be added to the stage.

@@ -1,5 +1,4 @@
 import QtQuick
-import QtQuick.Controls
 import QtQuick.Layouts
 import Tavix.SubjectStore
 
@@ -77,7 +76,7 @@ PanelDialog {
 
             Layout.fillWidth: true
             focus: true
-            problem: dialog.visible && dialog.panel && text !== "" ? dialog.panel.nameProblem(text, dialog.panel.itemOfDevice("").subject) : ""
+            problem: dialog.visible && dialog.panel && text !== "" ? dialog.panel.nameProblem(text, dialog.panel.noSubject) : ""
             Accessible.name: qsTr("Name")
         }
 

@@ -1,5 +1,4 @@
 import QtQuick
-import QtQuick.Controls
 
 /// A submenu of names to choose one from.
 PanelMenu {

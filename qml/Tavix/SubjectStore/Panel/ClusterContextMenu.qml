@@ -1,5 +1,4 @@
 import QtQuick
-import QtQuick.Controls
 
 /// The pattern and the device of a cluster.
 PanelMenu {

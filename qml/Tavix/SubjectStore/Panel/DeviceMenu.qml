@@ -1,5 +1,4 @@
 import QtQuick
-import QtQuick.Controls
 
 /// The devices that a cluster can be linked to.
 PanelMenu {

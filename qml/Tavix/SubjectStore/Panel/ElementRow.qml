@@ -1,5 +1,4 @@
 import QtQuick
-import QtQuick.Controls
 import QtQuick.Layouts
 
 /// A cluster with its device and pattern, or a marker with its place.
@@ -28,7 +27,7 @@ RowLayout {
         id: detail
 
         Layout.maximumWidth: line.width * 0.72
-        Layout.rightMargin: line.cluster ? 0 : Theme.badgeWidth + Theme.spacing
+        Layout.rightMargin: line.cluster || line.width < 12 * Theme.rowHeight ? 0 : Theme.badgeWidth + Theme.spacing
         text: line.cluster ? line.device || qsTr("no device") : line.place ? qsTr("%1, %2, %3 mm").arg(line.place.x.toFixed(1)).arg(line.place.y.toFixed(1)).arg(line.place.z.toFixed(1)) : ""
         elide: Text.ElideMiddle
         color: line.cluster && line.device === "" ? Theme.disabledText : Theme.secondaryText

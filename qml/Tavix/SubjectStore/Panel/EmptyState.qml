@@ -1,5 +1,4 @@
 import QtQuick
-import QtQuick.Controls
 
 /// Why the list shows no subject.
 Column {

@@ -1,5 +1,4 @@
 import QtQuick
-import QtQuick.Controls
 import QtQuick.Layouts
 
 /// Tells of a failure until somebody has seen it. It takes no room while there is none.

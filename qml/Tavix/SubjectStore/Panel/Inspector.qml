@@ -48,7 +48,6 @@ FocusScope {
         buttonText: Theme.text
         highlight: Theme.highlight
         highlightedText: Theme.highlightedText
-        placeholderText: Theme.secondaryText
         toolTipBase: Theme.raised
         toolTipText: Theme.text
         light: Theme.raised

@@ -12,6 +12,9 @@ Dialog {
     property string failure
     property real preferredWidth: 20 * Theme.rowHeight / 1.4
 
+    /// What had the focus, and gets it back.
+    property Item before
+
     default property alias form: questions.data
 
     /// To be answered with `finish`.
@@ -38,7 +41,14 @@ Dialog {
     modal: true
     focus: true
     padding: 2 * Theme.margin
-    onAboutToShow: failure = ""
+    onAboutToShow: {
+        failure = ""
+        before = parent.Window.activeFocusItem
+    }
+    onClosed: {
+        if (before)
+            before.forceActiveFocus()
+    }
     onOpened: {
         if (!questions.activeFocus)
             accept.forceActiveFocus(Qt.TabFocusReason)

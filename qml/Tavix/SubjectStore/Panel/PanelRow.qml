@@ -1,5 +1,4 @@
 import QtQuick
-import QtQuick.Controls
 import Tavix.SubjectStore
 
 /// One row of the list: what the model says of it, and what mouse and keys do to it.
@@ -16,6 +15,8 @@ Item {
     required property bool focused
     /// The id in words of the subject that is being renamed.
     required property string renamedSubject
+    /// From a text to what is wrong with it as that subject's name.
+    required property var nameProblem
     /// The list has put it by for another row.
     property bool pooled
 
@@ -31,8 +32,10 @@ Item {
     readonly property string sectionKey: model.sectionKey ?? ""
     readonly property var sectionWarnings: model.sectionWarnings ?? []
     readonly property var subjectStoreId: model.subjectStoreId?.copy()
+    /// What tells subjects apart; empty without one.
+    readonly property string subjectKey: subjectStoreId && subjectStoreId.valid ? subjectStoreId.toString() : ""
     readonly property string subjectName: model.subjectName ?? ""
-    readonly property string colour: subjectStoreId && subjectStoreId.valid && panel ? (panel.revision, panel.colour(subjectStoreId)) : ""
+    readonly property string colour: subjectKey !== "" && panel ? (panel.revision, panel.colour(subjectStoreId)) : ""
     readonly property bool subjectEnabled: model.subjectEnabled === true
     readonly property var subjectWarnings: model.subjectWarnings ?? []
     readonly property int subjectFlags: model.subjectFlags ?? 0
@@ -51,13 +54,13 @@ Item {
     readonly property bool isSection: rowKind === "section"
     readonly property bool isSlot: rowKind === "slot"
     readonly property bool isSubject: rowKind === "subject" || rowKind === "child"
-    readonly property bool occupied: isSlot && subjectStoreId !== undefined && subjectStoreId.valid
+    readonly property bool occupied: isSlot && subjectKey !== ""
     readonly property bool isObject: isSubject && (subjectFlags & (SubjectFlags.Rigid | SubjectFlags.Smart)) !== 0
     readonly property bool calibratable: isSubject && !isObject && model.subjectCalibration !== undefined
     readonly property bool selected: selection.holds(item)
-    readonly property bool renaming: !pooled && isSubject && subjectStoreId !== undefined && renamedSubject !== "" && renamedSubject === subjectStoreId.toString()
-    readonly property bool droppable: drag.active && isSlot && !occupied && drag.accepts(item)
-    readonly property bool target: droppable && drag.target !== undefined && drag.target.equals(item)
+    readonly property bool renaming: !pooled && isSubject && subjectKey !== "" && renamedSubject === subjectKey
+    readonly property bool droppable: drag.active && isSlot && !occupied && selection.key(item) !== "" && drag.accepts(item)
+    readonly property bool target: droppable && drag.target !== undefined && selection.key(drag.target) === selection.key(item)
     readonly property alias hovered: hover.hovered
 
     signal pressed(int modifiers)
@@ -71,8 +74,12 @@ Item {
     signal dragStarted
     signal dragMoved(point scene)
 
+    function warnings(): var {
+        return subjectStoreId && subjectStoreId.valid ? panel.warningsOf(subjectStoreId) : []
+    }
+
     height: Theme.rowHeight
-    opacity: drag.active && !isSection && !droppable && !(isSubject && subjectStoreId !== undefined && drag.subject.equals(subjectStoreId)) ? 0.4 : 1
+    opacity: drag.active && !isSection && !droppable && !(isSubject && subjectKey === drag.subjectKey) ? 0.4 : 1
     Accessible.role: Accessible.TreeItem
     Accessible.name: isSection ? qsTr("%1, %2 subjects").arg(sectionName).arg(count) : isSlot ? qsTr("Slot %1: %2").arg(slotName).arg(occupied ? subjectName : qsTr("empty")) : subjectName
     Accessible.selectable: item !== undefined
@@ -121,7 +128,6 @@ Item {
 
         SubjectRow {
             row: base
-            panel: base.panel
             onToggleEnabled: base.enabledToggled()
         }
     }
@@ -131,7 +137,6 @@ Item {
 
         SlotRow {
             row: base
-            panel: base.panel
         }
     }
 
@@ -175,7 +180,7 @@ Item {
         onActiveChanged: {
             if (!active)
                 return base.drag.end()
-            base.drag.begin(base.selection.itemAt(base.index).subject, base.subjectName, base.colour)
+            base.drag.begin(base.selection.itemAt(base.index), base.subjectName, base.colour)
             base.dragStarted()
         }
         onCentroidChanged: {

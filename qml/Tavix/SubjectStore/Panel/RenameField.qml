@@ -1,5 +1,4 @@
 import QtQuick
-import QtQuick.Controls
 
 /// Takes a new name in place of the old one: Enter accepts it, Escape leaves it.
 NameField {
@@ -32,10 +31,7 @@ NameField {
     problem: text === name ? "" : check.call(null, text)
     Accessible.name: qsTr("New name")
     onAccepted: finish(true)
-    onActiveFocusChanged: {
-        if (!activeFocus)
-            Qt.callLater(leave)
-    }
+    onActiveFocusChanged: soon.running = !activeFocus
     Keys.onEscapePressed: finish(false)
     // The list moves its current row by these.
     Keys.onUpPressed: event => event.accepted = true
@@ -43,6 +39,13 @@ NameField {
     Component.onCompleted: {
         forceActiveFocus()
         selectAll()
+    }
+
+    Timer {
+        id: soon
+
+        interval: 0
+        onTriggered: field.leave()
     }
 
     Tip {

@@ -1,6 +1,4 @@
 import QtQuick
-import QtQuick.Controls
-import Tavix.SubjectStore
 
 /// What can be done with a whole section.
 PanelMenu {

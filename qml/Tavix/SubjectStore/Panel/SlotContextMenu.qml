@@ -1,5 +1,4 @@
 import QtQuick
-import QtQuick.Controls
 import Tavix.SubjectStore
 
 /// Puts an object into an empty slot.

@@ -8,6 +8,7 @@ QtObject {
     required property var panel
     property bool active
     property var subject
+    property string subjectKey
     property string name
     property string colour
     /// Where the pointer is, in the list.
@@ -19,8 +20,11 @@ QtObject {
 
     signal finished(var subject, var slot)
 
-    function begin(what: var, label: string, swatch: string) {
-        subject = what
+    function begin(item: var, label: string, swatch: string) {
+        if (!item)
+            return
+        subject = item.subject
+        subjectKey = item.subject.toString()
         name = label
         colour = swatch
         target = undefined

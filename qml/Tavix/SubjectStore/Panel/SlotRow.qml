@@ -1,5 +1,4 @@
 import QtQuick
-import QtQuick.Controls
 import QtQuick.Layouts
 
 /// A slot of a character, and the object in it.
@@ -7,7 +6,6 @@ RowLayout {
     id: line
 
     required property var row
-    required property var panel
 
     spacing: Theme.spacing
     anchors.leftMargin: Theme.nameMargin
@@ -50,6 +48,5 @@ RowLayout {
 
     SubjectWarnings {
         row: line.row
-        panel: line.panel
     }
 }

@@ -1,5 +1,4 @@
 import QtQuick
-import QtQuick.Controls
 import Tavix.SubjectStore
 
 /// Every command for the selected subjects. What their kind does not have is not listed.

@@ -14,6 +14,7 @@ ListView {
     readonly property bool focused: activeFocus
     /// The id in words of the subject that is being renamed.
     property string renaming
+    property var renamed
     /// Where that is done; null once its row has gone, and with it the wish.
     property Item renameField
     /// A folded row over which something is dragged; -1 for none.
@@ -28,17 +29,22 @@ ListView {
     signal warningsWanted(Item badge, var warnings)
 
     function reveal(subject: var) {
-        awaited = undefined
-        const row = rows ? rows.rowOfSubject(subject) : -1
-        if (row < 0) {
-            awaited = subject
-            if (rows && (rows.search !== "" || rows.onlyWarnings))
-                filterInTheWay()
+        if (!rows || show(subject))
             return
-        }
+        awaited = subject
+        if (rows.search !== "" || rows.onlyWarnings)
+            filterInTheWay()
+    }
+
+    function show(subject: var): bool {
+        const row = rows.rowOfSubject(subject)
+        if (row < 0)
+            return false
+        awaited = undefined
         currentIndex = row
         rowSelection.anchor = row
         positionViewAtIndex(row, ListView.Contain)
+        return true
     }
 
     function startRename() {
@@ -47,7 +53,12 @@ ListView {
         reveal(actions.ids[0])
         const line = currentItem as PanelRow
         if (line && line.isSubject)
-            renaming = actions.ids[0].toString()
+            beginRename(actions.ids[0])
+    }
+
+    function beginRename(subject: var) {
+        renamed = subject
+        renaming = subject.toString()
     }
 
     /// Moves the current row there, and the selection with it as the modifiers ask.
@@ -155,12 +166,6 @@ ListView {
         edge = point.y < Theme.rowHeight ? -1 : point.y > height - Theme.rowHeight ? 1 : 0
     }
 
-    function endRename() {
-        if (!renameField)
-            renaming = ""
-    }
-
-    onRenameFieldChanged: Qt.callLater(endRename)
     model: rows
     clip: true
     focus: true
@@ -198,13 +203,14 @@ ListView {
         current: ListView.isCurrentItem
         focused: list.focused
         renamedSubject: list.renaming
+        nameProblem: text => list.panel.nameProblem(text, list.renamed)
         onPressed: modifiers => list.press(index, modifiers)
         onToggled: list.rows.toggle(index)
         onEnabledToggled: list.actions.tell(SubjectStore.setSubjectsEnabled(selected ? list.actions.ids : [subjectStoreId], !subjectEnabled))
         onMenuWanted: (x, y) => list.openMenu(index, x, y)
         onWarningsWanted: (badge, warnings) => list.warningsWanted(badge, warnings)
         onRenameShown: field => list.renameField = field
-        onRenamed: text => list.actions.tell(SubjectStore.setSubjectName(subjectStoreId, text))
+        onRenamed: text => list.actions.tell(SubjectStore.setSubjectName(list.renamed, text))
         ListView.onPooled: pooled = true
         ListView.onReused: pooled = false
         onRenameLeft: {
@@ -262,6 +268,20 @@ ListView {
     }
 
     Timer {
+        // The subject may have gone again: then nobody is to be taken anywhere later.
+        running: list.awaited !== undefined
+        interval: 3000
+        onTriggered: list.awaited = undefined
+    }
+
+    Timer {
+        // Not at once: when the row has another delegate now, that brings a field of its own.
+        running: list.renaming !== "" && list.renameField === null
+        interval: 50
+        onTriggered: list.renaming = ""
+    }
+
+    Timer {
         running: slotDrag.active && list.springRow >= 0
         interval: 600
         onTriggered: list.rows.setExpanded(list.springRow, true)
@@ -283,7 +303,7 @@ ListView {
 
         function onCountsChanged() {
             if (list.awaited)
-                list.reveal(list.awaited)
+                list.show(list.awaited)
         }
     }
 

@@ -64,9 +64,28 @@ Item {
         }
 
         SplitView {
+            id: split
+
             Layout.fillWidth: true
             Layout.fillHeight: true
             orientation: root.wide ? Qt.Horizontal : Qt.Vertical
+            handle: Rectangle {
+                id: grip
+
+                implicitWidth: Theme.unit
+                implicitHeight: Theme.unit
+                color: SplitHandle.hovered || SplitHandle.pressed ? Theme.highlight : Theme.line
+
+                // The view has set the size across; when it turns, that has to go.
+                Connections {
+                    target: split
+
+                    function onOrientationChanged() {
+                        grip.width = undefined
+                        grip.height = undefined
+                    }
+                }
+            }
 
             Rectangle {
                 SplitView.fillWidth: true

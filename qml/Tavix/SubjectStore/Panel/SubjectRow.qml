@@ -1,5 +1,4 @@
 import QtQuick
-import QtQuick.Controls
 import QtQuick.Layouts
 
 /// A subject, or a child of one.
@@ -7,7 +6,6 @@ RowLayout {
     id: line
 
     required property var row
-    required property var panel
 
     readonly property string name: row.subjectName
 
@@ -62,7 +60,7 @@ RowLayout {
         // qmllint disable unqualified
         sourceComponent: RenameField {
             name: line.name
-            check: text => line.panel.nameProblem(text, line.row.subjectStoreId)
+            check: text => line.row.nameProblem(text)
             onRenamed: text => line.row.renamed(text)
             onClosed: line.row.renameLeft()
         }
@@ -78,6 +76,5 @@ RowLayout {
 
     SubjectWarnings {
         row: line.row
-        panel: line.panel
     }
 }

@@ -5,7 +5,6 @@ Item {
     id: place
 
     required property var row
-    required property var panel
 
     implicitWidth: Theme.badgeWidth
     implicitHeight: Theme.rowHeight
@@ -13,11 +12,11 @@ Item {
     WarningBadge {
         id: badge
 
-        readonly property var warnings: hovered ? place.panel.warningsOf(place.row.subjectStoreId) : []
+        readonly property var warnings: hovered ? place.row.warnings() : []
 
         anchors.verticalCenter: parent.verticalCenter
         count: place.row.subjectWarnings.length
         tip: warnings.map(warning => warning.text).join("\n")
-        onClicked: place.row.warningsWanted(badge, place.panel.warningsOf(place.row.subjectStoreId))
+        onClicked: place.row.warningsWanted(badge, place.row.warnings())
     }
 }
