@@ -132,7 +132,17 @@ struct VSubjectPanelQml::Implementation
         });
   }
 
+  void ReadSelection()
+  {
+    const auto items = backend.selection ? backend.selection->Selection() : std::vector<SelectionItem>{};
+    selection = FromItems(items);
+    selectedSubjects = FromIds(SubjectsOf(items));
+  }
+
   const PanelBackend& backend;
+  // QML reads a list as a whole for each of its elements: that must cost nothing.
+  QVariantList selection;
+  QVariantList selectedSubjects;
   StoreWatch watch;
   VPanelRowsModel rows;
   VDeviceModel devices;
@@ -146,8 +156,14 @@ VSubjectPanelQml::VSubjectPanelQml(const PanelBackend& backend, const QObjectLis
     : m_implementation(std::make_unique<Implementation>(backend, sections))
 {
   connect(&m_implementation->watch, &StoreWatch::changed, this, &VSubjectPanelQml::revisionChanged);
+  m_implementation->ReadSelection();
   if (backend.selection)
-    m_implementation->selectionChanges = backend.selection->OnChange([this] { Q_EMIT selectionChanged(); });
+    m_implementation->selectionChanges = backend.selection->OnChange(
+        [this]
+        {
+          m_implementation->ReadSelection();
+          Q_EMIT selectionChanged();
+        });
 }
 
 VSubjectPanelQml::~VSubjectPanelQml() = default;
@@ -159,13 +175,12 @@ void VSubjectPanelQml::SetObjectPresetProvider(std::shared_ptr<RunaCorePluginInt
 
 QVariantList VSubjectPanelQml::selection() const
 {
-  const auto& manager = m_implementation->backend.selection;
-  return manager ? FromItems(manager->Selection()) : QVariantList{};
+  return m_implementation->selection;
 }
 
 QVariantList VSubjectPanelQml::selectedSubjects() const
 {
-  return FromIds(m_implementation->backend.SelectedSubjects());
+  return m_implementation->selectedSubjects;
 }
 
 QAbstractItemModel* VSubjectPanelQml::rows() const

@@ -8,16 +8,15 @@
 #include "SubjectStoreUI/VSubjectListModelStore.h"
 #include "SubjectStoreUI/VSubjectModelInternalData.h"
 #include "SubjectStoreUI/VSubjectStoreProxyModel.h"
+#include "benchmarks/FrameTimes.h"
 
 #include <QDir>
-#include <QElapsedTimer>
 #include <QGuiApplication>
 #include <QQmlContext>
 #include <QQmlEngine>
 #include <QQuickItem>
 #include <QQuickView>
 #include <QTemporaryFile>
-#include <QTimer>
 
 #include <algorithm>
 #include <chrono>
@@ -80,20 +79,6 @@ void Edit(NMX::IStore& store, const std::vector<NMX::TSubjectStoreId>& ids, std:
   (void)editor->Commit();
 }
 
-void Report(const char* what, std::vector<double> milliseconds)
-{
-  if (milliseconds.empty())
-  {
-    std::printf("%s no frames\n", what);
-    return;
-  }
-  std::sort(milliseconds.begin(), milliseconds.end());
-  const auto at = [&](double part)
-  { return milliseconds[static_cast<std::size_t>(part * static_cast<double>(milliseconds.size() - 1))]; };
-  std::printf("%-22s %6zu frames; from frame to frame: median %.1f ms, 95 %% %.1f, 99 %% %.1f, longest %.1f\n", what,
-              milliseconds.size(), at(0.5), at(0.95), at(0.99), at(1));
-}
-
 }
 
 int main(int argumentCount, char** arguments)
@@ -119,27 +104,9 @@ int main(int argumentCount, char** arguments)
   if (view.status() != QQuickView::Ready)
     return 1;
 
-  std::vector<double> frames;
-  QElapsedTimer last;
-  QObject::connect(
-      &view, &QQuickWindow::frameSwapped, &view,
-      [&]
-      {
-        if (last.isValid())
-          frames.push_back(static_cast<double>(last.nsecsElapsed()) / 1e6);
-        last.start();
-      },
-      Qt::DirectConnection);
-  const auto run = [&](std::chrono::milliseconds time)
-  {
-    frames.clear();
-    // Not to quit: that would close the window.
-    QTimer::singleShot(time, &application, [] { QCoreApplication::exit(); });
-    QCoreApplication::exec();
-    return frames;
-  };
-  (void)run(1s); // warm
-  Report("nothing changes:", run(seconds * 1000ms));
+  FrameTimes frames(view);
+  frames.Run(nullptr, 1s); // warm
+  frames.Run("nothing changes:", seconds * 1000ms);
   std::size_t edits = 0;
   {
     const std::jthread editing(
@@ -151,7 +118,7 @@ int main(int argumentCount, char** arguments)
             Edit(*store, ids, edits++);
           }
         });
-    Report("1,000 edits a second:", run(seconds * 1000ms));
+    frames.Run("1,000 edits a second:", seconds * 1000ms);
   }
   std::printf("%zu edits in %d s\n", edits, seconds);
   gui->Stop();

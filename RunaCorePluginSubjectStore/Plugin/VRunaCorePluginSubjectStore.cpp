@@ -223,7 +223,7 @@ bool VRunaCorePluginSubjectStore::RegisterUserInterface(IPluginHost& host, IUser
   command.text = "Assign &Smart Object Patterns";
   command.shortcut = "Ctrl+Shift+P";
   command.toolTip = "Give every smart cluster an active marker pattern of its own";
-  command.colour = userInterface.ThemeColour("text");
+  command.colour = userInterface.ThemeColour("highlight");
   command.possible = [controls, store = Store(host)](std::string& reason)
   {
     std::vector<NMX::TSubjectStoreId> objects;

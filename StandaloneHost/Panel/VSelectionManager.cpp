@@ -1,6 +1,9 @@
 #include "StandaloneHost/Panel/VSelectionManager.h"
 
-#include <algorithm>
+#include <cstdint>
+#include <set>
+#include <string>
+#include <tuple>
 #include <utility>
 
 namespace Panel
@@ -9,17 +12,18 @@ namespace Panel
 void VSelectionManager::Select(std::vector<SelectionItem> items)
 {
   std::vector<SelectionItem> selection;
+  std::set<std::tuple<NMX::TSubjectStoreId, std::int32_t, std::string>> known;
   for (SelectionItem& item : items)
-    if (std::ranges::find(selection, item) == selection.end())
+    if (known.emplace(item.subject, item.slot, item.device).second)
       selection.push_back(std::move(item));
   if (selection == m_selection)
     return;
   m_selection = std::move(selection);
-  std::erase_if(m_handlers, [](const auto& known) { return known.expired(); });
+  std::erase_if(m_handlers, [](const auto& handler) { return handler.expired(); });
   // A handler may subscribe or end subscriptions: one that has been ended by then is not called any more.
   const auto handlers = m_handlers;
-  for (const auto& known : handlers)
-    if (const auto handler = known.lock())
+  for (const auto& subscribed : handlers)
+    if (const auto handler = subscribed.lock())
       (*handler)();
 }
 

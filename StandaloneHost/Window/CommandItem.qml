@@ -39,7 +39,9 @@ MenuItem {
             spacing: 0
 
             Text {
-                text: item.text
+                // "&" stands before the letter that gives the command.
+                text: item.text.replace(/</g, "&lt;").replace(/&([^&l]|l(?!t;))/, "<u>$1</u>")
+                textFormat: Text.StyledText
                 font: item.font
                 color: item.foreground
                 elide: Text.ElideRight
