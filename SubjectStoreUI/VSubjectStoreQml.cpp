@@ -39,8 +39,8 @@ namespace
 
 using Clusters = std::vector<NMX::SmartCluster>;
 
-/// How long changes are gathered before the models show them.
-constexpr int batchingIntervalInMilliseconds = 100;
+/// How long changes are gathered before the models show them: what a client changes is seen within a tenth of a second.
+constexpr int batchingIntervalInMilliseconds = 50;
 
 /// The kinds that have sections, each with the features of which one must be on, in the order of the sections.
 constexpr std::pair<ESubjectKind, std::uint32_t> sectionFeatures[] = {

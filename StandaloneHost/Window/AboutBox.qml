@@ -41,7 +41,7 @@ HostDialog {
                     required property int index
 
                     text: modelData
-                    font: box.font
+                    font: box.font // qmllint disable unqualified
                     color: index % 2 === 0 ? Theme.secondaryText : Theme.text
                     selectionColor: Theme.highlight
                     selectedTextColor: Theme.highlightedText
@@ -58,7 +58,7 @@ HostDialog {
 
         Button {
             text: "Close"
-            DialogButtonBox.buttonRole: DialogButtonBox.RejectRole
+            DialogButtonBox.buttonRole: DialogButtonBox.RejectRole // qmllint disable type
         }
     }
 }

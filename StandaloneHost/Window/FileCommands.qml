@@ -100,7 +100,8 @@ Item {
         title: "Save configuration"
         fileMode: FileDialog.SaveFile
         acceptLabel: "Save"
-        options: FileDialog.DontConfirmOverwrite // not every kind of dialog would ask
+        // Not every kind of dialog would ask.
+        options: FileDialog.DontConfirmOverwrite // qmllint disable type property
         defaultSuffix: "xml"
         nameFilters: ["Subject configurations (*.xml)", "All files (*)"]
         onAccepted: commands.saveTo(selectedFile)

@@ -49,8 +49,10 @@ Menu {
             colour: modelData.colour
             enabled: modelData.possible
             reason: modelData.reason
+            // qmllint disable unqualified
             onTriggered: hostMenu.perform(modelData)
             onImplicitWidthChanged: Qt.callLater(hostMenu.fit) // a reason is laid out after it was given
+            // qmllint enable unqualified
         }
         onObjectAdded: (index, object) => hostMenu.addItem(object)
         onObjectRemoved: (index, object) => hostMenu.removeItem(object)
@@ -64,7 +66,7 @@ Menu {
 
             sequence: modelData.shortcut
             enabled: modelData.shortcut !== ""
-            onActivated: hostMenu.perform(modelData)
+            onActivated: hostMenu.perform(modelData) // qmllint disable unqualified
         }
     }
 }

@@ -113,8 +113,10 @@ MenuBar {
             required property string modelData
 
             title: modelData
+            // qmllint disable unqualified
             commands: bar.host.commands.commandsOf(modelData)
             onFailed: (title, reason) => bar.failed(title, reason)
+            // qmllint enable unqualified
         }
         onObjectAdded: (index, object) => bar.insertMenu(bar.count - 1, object)
         onObjectRemoved: (index, object) => bar.removeMenu(object)

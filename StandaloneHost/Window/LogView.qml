@@ -165,6 +165,7 @@ Pane {
             Accessible.role: Accessible.List
             Accessible.name: "Log"
 
+            // qmllint disable unqualified
             delegate: LogRow {
                 required property int index
                 required property var model
@@ -182,6 +183,7 @@ Pane {
                     onTapped: list.tapped(parent.index, true)
                 }
             }
+            // qmllint enable unqualified
 
             function tapped(row: int, extend: bool) {
                 forceActiveFocus()
@@ -199,7 +201,7 @@ Pane {
 
                 function onRowsInserted() {
                     if (list.following && !list.moving)
-                        Qt.callLater(list.positionViewAtEnd)
+                        Qt.callLater(list.positionViewAtEnd) // qmllint disable type
                 }
 
                 function onRowsRemoved(parent, firstGone, lastGone) {

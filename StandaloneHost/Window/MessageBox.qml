@@ -34,7 +34,7 @@ HostDialog {
     // Not before: what is done then may have something to tell.
     onClosed: {
         if (agreed)
-            action()
+            action.call(null)
     }
 
     contentItem: Label {
@@ -51,14 +51,14 @@ HostDialog {
             id: agree
             text: box.answer
             visible: box.action !== null
-            DialogButtonBox.buttonRole: DialogButtonBox.AcceptRole
+            DialogButtonBox.buttonRole: DialogButtonBox.AcceptRole // qmllint disable type
             Keys.onReturnPressed: clicked()
             Keys.onEnterPressed: clicked()
         }
         Button {
             id: close
             text: box.action ? "Cancel" : "Close"
-            DialogButtonBox.buttonRole: DialogButtonBox.RejectRole
+            DialogButtonBox.buttonRole: DialogButtonBox.RejectRole // qmllint disable type
             Keys.onReturnPressed: clicked()
             Keys.onEnterPressed: clicked()
         }

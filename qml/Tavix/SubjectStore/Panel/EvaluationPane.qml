@@ -112,8 +112,8 @@ ScrollPane {
     ProgressLine {
         width: parent.width
         visible: pane.on
-        to: Math.max(1, pane.total)
-        value: pane.done
+        // A part of 1: a bar forgets a value that is beyond its end at the time.
+        value: pane.total > 0 ? pane.done / pane.total : 0
         Accessible.name: qsTr("Progress of the comparisons")
     }
     PaneHeading {

@@ -1,5 +1,4 @@
 import QtQuick
-import QtQuick.Controls
 import "MarkerProjection.js" as Projection
 
 /// Markers in space, drawn in perspective. The mouse and the arrow keys turn them, the wheel, + and - zoom, Page Up and

@@ -78,7 +78,7 @@ Item {
 
                 // The view has set the size across; when it turns, that has to go.
                 Connections {
-                    target: split
+                    target: split // qmllint disable unqualified
 
                     function onOrientationChanged() {
                         grip.width = undefined
