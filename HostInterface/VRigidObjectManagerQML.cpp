@@ -59,7 +59,7 @@ void VRigidObjectManagerQML::UnregisterSingletonQML()
   Registered().reset();
 }
 
-bool VRigidObjectManagerQML::available() const
+bool VRigidObjectManagerQML::isAvailable() const
 {
   return IsRegistered();
 }

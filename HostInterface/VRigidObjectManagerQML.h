@@ -22,8 +22,6 @@ class IStore;
 class VRigidObjectManagerQML final : public QObject
 {
   Q_OBJECT
-  /// Whether the services are there: not after it has been unregistered.
-  Q_PROPERTY(bool available READ available)
 
 public:
   [[nodiscard]] static bool IsRegistered();
@@ -41,7 +39,8 @@ public:
   /// Lets go of the services. QML that still has the singleton finds it not available.
   static void UnregisterSingletonQML();
 
-  [[nodiscard]] bool available() const;
+  /// Whether the services are there: not after it has been unregistered.
+  Q_INVOKABLE [[nodiscard]] bool isAvailable() const;
 
 private:
   VRigidObjectManagerQML() = default;

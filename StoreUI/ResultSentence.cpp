@@ -50,4 +50,13 @@ std::string ResultSentence(NMX::IResult result)
   return sentence != sentences.end() ? sentence->second : "It failed; the log may say more.";
 }
 
+std::string PatternSentence(NMX::IResult result)
+{
+  if (result == NMX::EResult::NotFound)
+    return "A cluster is of a type that is not known here.";
+  if (result == NMX::EResult::NotSupported)
+    return "No set of patterns serves all these types of cluster together.";
+  return ResultSentence(result);
+}
+
 }

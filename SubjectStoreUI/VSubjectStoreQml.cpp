@@ -7,6 +7,7 @@
 #include "RunaCorePluginSubjectStore/Subjects/ClusterEdits.h"
 #include "RunaCorePluginSubjectStore/Subjects/SlotAssignment.h"
 #include "StoreInterface/EntryPaths.h"
+#include "StoreUI/ResultSentence.h"
 #include "SubjectStoreUI/ObjectEvaluationWatch.h"
 #include "SubjectStoreUI/PanelBackend.h"
 #include "SubjectStoreUI/PanelParameters.h"
@@ -351,7 +352,10 @@ VResultGadget VSubjectStoreQml::createSmartObjects(const QVariantList& i_Selecti
 VResultGadget VSubjectStoreQml::assignOptimalActiveMarkerPatterns(const QVariantList& /*i_SelectionItems*/)
 {
   const auto controls = m_implementation->backend.Get(&IPanelServices::SmartObjectControls);
-  return controls ? controls->AssignOptimalPatterns() : IResult(EResult::NotAvailable);
+  if (!controls)
+    return IResult(EResult::NotAvailable);
+  const IResult assigned = controls->AssignOptimalPatterns();
+  return {assigned, StoreUI::PatternSentence(assigned)};
 }
 
 bool VSubjectStoreQml::canMergeSelectedSmartObjects(const QVariantList& i_SelectionItems) const

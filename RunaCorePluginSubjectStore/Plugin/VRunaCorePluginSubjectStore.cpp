@@ -240,7 +240,7 @@ bool VRunaCorePluginSubjectStore::RegisterUserInterface(IPluginHost& host, IUser
     const NMX::IResult assigned =
         controls ? controls->AssignOptimalPatterns() : NMX::IResult(NMX::EResult::NotAvailable);
     if (assigned.Failed())
-      reason = StoreUI::ResultSentence(assigned);
+      reason = StoreUI::PatternSentence(assigned);
     return assigned;
   };
   userInterface.AddCommand(std::move(command));

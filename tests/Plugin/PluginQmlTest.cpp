@@ -1,6 +1,7 @@
 #include "HostInterface/RunaCorePluginInterface/IQmlContext.h"
 #include "HostInterface/RunaCorePluginInterface/IUserInterface.h"
 #include "HostInterface/VRigidObjectManagerQML.h"
+#include "RunaCorePluginSubjectStore/SmartObjectServices/DeviceTypes.h"
 #include "StandaloneHost/PluginModule.h"
 #include "StandaloneHost/SmartObjects/VSmartObjectControls.h"
 #include "StandaloneHost/VPluginHost.h"
@@ -132,7 +133,7 @@ TEST_F(PluginQmlTest, TheRigidObjectManagerIsRegisteredOnceAndOnlyByWhoHasItsToo
   EXPECT_EQ(ofHost.use_count(), 2) << "it is what it was";
   QQmlComponent component(&context.engine);
   component.setData("import QtQml\nimport Tavix.RunaCore.RigidObjectManager 1.0\nQtObject { property bool ok: "
-                    "RigidObjectManager.available }",
+                    "RigidObjectManager.isAvailable() }",
                     {});
   const std::unique_ptr<QObject> object(component.create());
   ASSERT_TRUE(object) << component.errorString().toStdString();
@@ -161,12 +162,15 @@ TEST_F(PluginQmlTest, TheMenuCommandSaysWhyItCannotBeTriggered)
   EXPECT_EQ(menus.commands[0].trigger(reason), NMX::IResult(NMX::EResult::NotAvailable));
   EXPECT_FALSE(reason.empty());
 
-  const auto controls =
-      std::make_shared<SmartObjects::VSmartObjectControls>(store, std::make_shared<SmartObjects::DeviceLayouts>());
+  const auto layouts = std::make_shared<SmartObjects::DeviceLayouts>();
+  const auto controls = std::make_shared<SmartObjects::VSmartObjectControls>(store, layouts);
   EXPECT_EQ(trigger(controls), "There are no smart objects.");
   const Id glove = Add(NMX::ESubjectKind::SmartObjects, "Glove");
   Set(glove, NMX::Paths::SmartClusters(), std::vector<NMX::SmartCluster>{{"Palm", "", 0, "Corvex1"}});
   EXPECT_EQ(trigger(controls), "possible");
+  EXPECT_EQ(menus.commands[0].trigger(reason), NMX::IResult(NMX::EResult::NotFound));
+  EXPECT_EQ(reason, "A cluster is of a type that is not known here.");
+  SmartObjectServices::RegisterDeviceTypes(*layouts);
   EXPECT_TRUE(menus.commands[0].trigger(reason).Succeeded());
   EXPECT_NE(Get<std::vector<NMX::SmartCluster>>(glove, NMX::Paths::SmartClusters())[0].pattern, 0U);
 }

@@ -27,7 +27,8 @@ FocusScope {
     }
 
     component Page: Loader {
-        readonly property bool current: StackLayout.isCurrentItem
+        // Not StackLayout.isCurrentItem, which Qt never lets go of.
+        required property bool current
 
         active: false
         onCurrentChanged: {
@@ -89,36 +90,42 @@ FocusScope {
             currentIndex: tabs.currentIndex
 
             Page {
+                current: tabs.currentIndex === 0
                 sourceComponent: SelectedPane {
                     panel: inspector.panel
                     onFinished: result => failure.show(result)
                 }
             }
             Page {
+                current: tabs.currentIndex === 1
                 sourceComponent: CalibrationPane {
                     panel: inspector.panel
                     onFinished: result => failure.show(result)
                 }
             }
             Page {
+                current: tabs.currentIndex === 2
                 sourceComponent: EvaluationPane {
                     panel: inspector.panel
                     onFinished: result => failure.show(result)
                 }
             }
             Page {
+                current: tabs.currentIndex === 3
                 sourceComponent: DevicesPane {
                     panel: inspector.panel
                     onFinished: result => failure.show(result)
                 }
             }
             Page {
+                current: tabs.currentIndex === 4
                 sourceComponent: PresetsPane {
                     panel: inspector.panel
                     onFinished: result => failure.show(result)
                 }
             }
             Page {
+                current: tabs.currentIndex === 5
                 sourceComponent: SettingsPane {
                     panel: inspector.panel
                     onFinished: result => failure.show(result)
