@@ -139,6 +139,25 @@ struct VSubjectPanelQml::Implementation
     selectedSubjects = FromIds(SubjectsOf(items));
   }
 
+  /// The selection keeps subjects that have left the store; no command could do anything with them.
+  void DeselectRemoved() const
+  {
+    if (!backend.selection)
+      return;
+    std::vector<SelectionItem> items = backend.selection->Selection();
+    const auto dropGone = [&items](const NMX::IStoreReader& access)
+    {
+      return std::erase_if(items,
+                           [&access](const SelectionItem& item)
+                           {
+                             ESubjectKind kind{};
+                             return item.subject.Valid() && access.Kind(item.subject, kind).Failed();
+                           });
+    };
+    if (dropGone(*backend.store->Reader()) > 0)
+      backend.selection->Select(std::move(items));
+  }
+
   const PanelBackend& backend;
   // QML reads a list as a whole for each of its elements: that must cost nothing.
   QVariantList selection;
@@ -155,8 +174,13 @@ struct VSubjectPanelQml::Implementation
 VSubjectPanelQml::VSubjectPanelQml(const PanelBackend& backend, const QObjectList& sections)
     : m_implementation(std::make_unique<Implementation>(backend, sections))
 {
-  connect(&m_implementation->watch, &StoreWatch::changed, this, &VSubjectPanelQml::revisionChanged);
   m_implementation->ReadSelection();
+  connect(&m_implementation->watch, &StoreWatch::changed, this,
+          [this]
+          {
+            m_implementation->DeselectRemoved();
+            Q_EMIT revisionChanged();
+          });
   if (backend.selection)
     m_implementation->selectionChanges = backend.selection->OnChange(
         [this]

@@ -28,7 +28,7 @@ struct PanelBackend;
 class VSubjectPanelQml : public QObject
 {
   Q_OBJECT
-  /// VSelectionItemGadget, in the order in which they were selected.
+  /// VSelectionItemGadget, in the order in which they were selected. A subject that leaves the store leaves it too.
   Q_PROPERTY(QVariantList selection READ selection NOTIFY selectionChanged)
   /// VStoreIdGadget of the subjects among them.
   Q_PROPERTY(QVariantList selectedSubjects READ selectedSubjects NOTIFY selectionChanged)

@@ -12,6 +12,8 @@ TestCase {
     property alias view: subject
     readonly property var panel: subject.panel
     readonly property var rows: panel.rows
+    /// What a command says of a subject that a client has removed.
+    readonly property string notThere: "It is no longer there."
     readonly property Item list: find(item => item.reveal !== undefined && item.rows !== undefined, subject)
 
     when: windowShown
@@ -31,6 +33,9 @@ TestCase {
         panel.select([])
         rows.search = ""
         rows.onlyWarnings = false
+        const message = find(item => item.Accessible.role === Accessible.AlertMessage && item.clear !== undefined)
+        if (message)
+            message.clear()
         tryVerify(() => rows.totalCount === 0)
         mouseMove(subject, 1, 1)
         list.forceActiveFocus()
@@ -71,8 +76,18 @@ TestCase {
         mouseClick(item, item.width / 2, item.height / 2, button ?? Qt.LeftButton, modifiers ?? Qt.NoModifier)
     }
 
+    function add(kind: string, ...names) {
+        names.forEach(name => verify(stage.add(kind, name)))
+    }
+
     function idOf(name: string): var {
         return SubjectStore.subjects().find(id => SubjectStore.subjectName(id) === name)
+    }
+
+    function sectionOf(key: string): Item {
+        let row = null
+        tryVerify(() => (row = list.itemAtIndex(rows.rowOfSection(key))) !== null)
+        return row
     }
 
     /// The row of a subject, in view.
@@ -92,6 +107,7 @@ TestCase {
 
     /// The row beneath a subject whose slot, or element, has that name.
     function rowBeneath(name: string, beneath: string): Item {
+        rowOf(name)
         const row = rows.rowOfSubject(idOf(name))
         rows.setExpanded(row, true)
         let found = null
@@ -117,6 +133,29 @@ TestCase {
         compare(panel.selectedSubjects.length, names.length)
     }
 
+    /// Opens the row's menu as far as a submenu, and waits for a line of it.
+    function openMenu(row: Item, ...texts): Item {
+        press(row, Qt.RightButton)
+        let line = null
+        texts.forEach((text, i) => {
+            tryVerify(() => (line = lineOf(text)) !== null, 3000, text)
+            wait(50) // the menu is laid out
+            if (i < texts.length - 1)
+                press(line)
+        })
+        return line
+    }
+
+    /// Leaves the menu with all that it has opened.
+    function leaveMenu() {
+        tryVerify(() => {
+            if (find(item => item.subMenu !== undefined && item.height > 0) === null)
+                return true
+            keyClick(Qt.Key_Escape)
+            return false
+        })
+    }
+
     /// The line of an open menu.
     function lineOf(text: string): Item {
         return find(item => item.subMenu !== undefined && item.text === text && item.height > 0)
@@ -125,6 +164,11 @@ TestCase {
     /// Opens the row's menu and goes through it to a command.
     function choose(row: Item, ...texts) {
         press(row, Qt.RightButton)
+        follow(...texts)
+    }
+
+    /// Goes through an open menu to a command.
+    function follow(...texts) {
         for (const text of texts) {
             let line = null
             tryVerify(() => (line = lineOf(text)) !== null, 3000, text)
@@ -133,6 +177,14 @@ TestCase {
             press(line)
         }
         tryVerify(() => lineOf(texts[0]) === null, 3000, "the menu closes")
+    }
+
+    /// Waits for a palette; its grid.
+    function openPalette(): Item {
+        let grid = null
+        tryVerify(() => (grid = find(item => item.cellWidth !== undefined)) !== null, 3000, "a palette opens")
+        wait(50)
+        return grid
     }
 
     function type(text: string) {
@@ -144,5 +196,60 @@ TestCase {
     function showPage(name: string) {
         const inspector = find(item => item.pages !== undefined && item.show !== undefined)
         inspector.show(name)
+    }
+
+    function checkBox(text: string): Item {
+        return find(item => item.checkState !== undefined && item.text === text)
+    }
+
+    function button(text: string): Item {
+        let found = null
+        tryVerify(() => (found = find(item => item.display !== undefined && item.text === text)) !== null, 3000, text)
+        return found
+    }
+
+    /// The button cannot be pressed, and says why to who points at it.
+    function verifyRefused(refused: Item, reason: string) {
+        tryCompare(refused, "enabled", false)
+        settle(refused)
+        let at = 2
+        tryVerify(() => {
+            mouseMove(refused, at = 7 - at, 5) // a dialog that has just opened misses the first
+            return !gone(reason)
+        }, 3000, reason)
+        mouseMove(test.view, 1, 1)
+    }
+
+    /// Waits until an item is moved no more.
+    function settle(item: Item) {
+        let before = NaN
+        tryVerify(() => {
+            const last = before
+            before = item.mapToItem(test.view, 0, 0).y
+            return before === last
+        })
+    }
+
+    /// Clicks an editor; the pane scrolls to what has the focus.
+    function enter(item: Item) {
+        settle(item)
+        item.forceActiveFocus(Qt.TabFocusReason)
+        settle(item)
+        press(item)
+    }
+
+    /// Types in place of what an editor holds.
+    function fill(item: Item, text: string) {
+        enter(item)
+        keyClick(Qt.Key_A, Qt.ControlModifier)
+        type(text)
+    }
+
+    function pick(box: Item, text: string) {
+        enter(box)
+        let line = null
+        tryVerify(() => box.popup.opened && (line = find(item => item.text === text, box.popup.contentItem)) !== null, 3000, text)
+        press(line)
+        tryVerify(() => !box.popup.visible)
     }
 }

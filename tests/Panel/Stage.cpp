@@ -3,6 +3,7 @@
 #include "HostInterface/IFileLocations.h"
 #include "HostInterface/RunaCorePluginInterface/IAccessRights.h"
 #include "HostInterface/RunaCorePluginInterface/IUserInterface.h"
+#include "RunaCorePluginSubjectStore/SmartObjectServices/DeviceTypes.h"
 #include "StandaloneHost/Calibration/VCalibrationProvider.h"
 #include "StandaloneHost/Characters/VCharacterControls.h"
 #include "StandaloneHost/Evaluation/VObjectEvaluationEngine.h"
@@ -15,6 +16,7 @@
 #include "StandaloneHost/Postal/VGuiPostalService.h"
 #include "StandaloneHost/Settings/PanelSettings.h"
 #include "StandaloneHost/Simulation/VDeviceServices.h"
+#include "StandaloneHost/SmartObjects/AutoPatternManagement.h"
 #include "StandaloneHost/SmartObjects/VSmartObjectControls.h"
 #include "StandaloneHost/Store/VStore.h"
 #include "StandaloneHost/VPluginHost.h"
@@ -97,6 +99,7 @@ struct Stage::Services
                                                 locations->Folders(IFileLocations::subjectTemplates),
                                                 locations->Folders(IFileLocations::subjectSkins),
                                                 locations->Folders(IFileLocations::retargets)});
+    SmartObjectServices::RegisterDeviceTypes(*layouts);
     calibration->Open(gui);
     HostServices services;
     services.store = store;
@@ -145,6 +148,7 @@ struct Stage::Services
   const std::shared_ptr<Simulation::VDeviceServices> devices =
       std::make_shared<Simulation::VDeviceServices>(store, postal, std::chrono::milliseconds(300));
   const std::shared_ptr<FileIO::VRunaCoreFileIO> fileIO = std::make_shared<FileIO::VRunaCoreFileIO>(store);
+  const std::shared_ptr<const void> patterns = SmartObjects::ManagePatterns(store, smartObjects, gui);
   const std::shared_ptr<Panel::VSelectionManager> selection = std::make_shared<Panel::VSelectionManager>();
   OneCommand userInterface;
   PluginPointer plugin = LoadPlugin(SUBJECT_STORE_PLUGIN_FILE);
@@ -250,7 +254,8 @@ bool Stage::setClusters(const QString& name, const QVariantList& clusters)
   for (const QVariant& cluster : clusters)
   {
     const QVariantMap map = cluster.toMap();
-    made.push_back({Text(map["label"].toString()), Text(map["device"].toString()), map["pattern"].toUInt(), "Corvex1"});
+    made.push_back({Text(map["label"].toString()), Text(map["device"].toString()), map["pattern"].toUInt(),
+                    Text(map.value("type", "Corvex1").toString())});
   }
   return m_services->Edit(name, [&](NMX::IEntryEditor& editor, TSubjectStoreId id)
                           { return editor.SetValue(id, Paths::SmartClusters(), made, NMX::ENotify::Yes); });
@@ -310,6 +315,8 @@ QVariant Stage::entry(const QString& name, const QString& path) const
   if (const auto value = m_services->Read<bool>(name, entry))
     return *value;
   if (const auto value = m_services->Read<std::int32_t>(name, entry))
+    return *value;
+  if (const auto value = m_services->Read<std::uint32_t>(name, entry))
     return *value;
   if (const auto value = m_services->Read<std::string>(name, entry))
     return QString::fromStdString(*value);
@@ -380,4 +387,52 @@ bool Stage::triggerCommand()
 {
   std::string reason;
   return m_services->userInterface.command.trigger(reason).Succeeded();
+}
+
+QString Stage::slotOf(const QString& name) const
+{
+  const auto slot = m_services->Read<TSubjectStoreId>(name, Paths::ParentSubjectSlotId());
+  const QString parent = entry(name, "ParentSubjectId").toString();
+  const auto known = m_services->Read<std::vector<NMX::Slot>>(parent, Paths::Slots());
+  for (const NMX::Slot& one : known.value_or(std::vector<NMX::Slot>{}))
+    if (slot == one.id)
+      return QString::fromStdString(one.name);
+  return {};
+}
+
+QVariantList Stage::markers(const QString& name) const
+{
+  QVariantList places;
+  const auto found = m_services->Read<std::vector<NMX::Position>>(name, Paths::Markers());
+  for (const NMX::Position& marker : found.value_or(std::vector<NMX::Position>{}))
+    places.append(QVariant(QVariantList{marker.x, marker.y, marker.z}));
+  return places;
+}
+
+QString Stage::applicationEntry(const QString& path) const
+{
+  const auto access = m_services->store->Reader();
+  const NMX::Value* value = access->FindApplicationEntry(NMX::EntryPath(Text(path)));
+  if (value == nullptr)
+    return {};
+  if (const auto* colour = std::get_if<NMX::Colour>(value))
+    return QString::fromStdString(NMX::ColourToText(*colour));
+  if (const bool* truth = std::get_if<bool>(value))
+    return *truth ? "true" : "false";
+  const auto* text = std::get_if<std::string>(value);
+  return text != nullptr ? QString::fromStdString(*text) : QString();
+}
+
+bool Stage::setApplicationEntry(const QString& path, const QVariant& value)
+{
+  NMX::Value made;
+  if (value.typeId() == QMetaType::Bool)
+    made = value.toBool();
+  else if (value.typeId() == QMetaType::Int || value.typeId() == QMetaType::Double)
+    made = value.toDouble();
+  else if (value.isValid())
+    made = Text(value.toString());
+  const auto editor = m_services->store->Editor();
+  return editor->SetApplicationEntry(NMX::EntryPath(Text(path)), std::move(made)).Succeeded() &&
+         editor->Commit().Succeeded();
 }

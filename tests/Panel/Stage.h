@@ -32,7 +32,7 @@ public:
   /// Sets an entry: a truth value, a number, a text, or, of the parent, a subject's name.
   Q_INVOKABLE bool set(const QString& name, const QString& path, const QVariant& value);
   Q_INVOKABLE bool setMarkers(const QString& name, const QVariantList& places);
-  /// Clusters: {label, device, pattern}.
+  /// Clusters: {label, device, pattern, type}; of the usual type without one.
   Q_INVOKABLE bool setClusters(const QString& name, const QVariantList& clusters);
   Q_INVOKABLE bool setSlots(const QString& name, const QStringList& slotNames);
   Q_INVOKABLE void addDevice(const QString& urn);
@@ -53,6 +53,15 @@ public:
   /// Whether the plugin's menu command can be triggered; the reason why not is empty then.
   Q_INVOKABLE [[nodiscard]] QString commandProblem() const;
   Q_INVOKABLE bool triggerCommand();
+
+  /// The name of the slot that the subject is in; empty when it is in none.
+  Q_INVOKABLE [[nodiscard]] QString slotOf(const QString& name) const;
+  /// The places of the markers, as setMarkers takes them.
+  Q_INVOKABLE [[nodiscard]] QVariantList markers(const QString& name) const;
+  /// A text, a colour or a truth value of the application, as text; empty when it is not set.
+  Q_INVOKABLE [[nodiscard]] QString applicationEntry(const QString& path) const;
+  /// A truth value, a number or a text; nothing to remove the entry.
+  Q_INVOKABLE bool setApplicationEntry(const QString& path, const QVariant& value);
 
 private:
   struct Services;

@@ -25,8 +25,7 @@ PanelDialog {
         kind = what
         readTemplates()
         name.text = ""
-        open()
-        name.forceActiveFocus()
+        show(name)
     }
 
     function readTemplates() {

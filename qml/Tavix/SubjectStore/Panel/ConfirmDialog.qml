@@ -20,7 +20,7 @@ PanelDialog {
         option = optionText
         choice.checked = false
         deed = action
-        open()
+        show(null)
     }
 
     onCommitted: finish(deed.call(null, choice.visible && choice.checked))

@@ -9,13 +9,19 @@ PanelMenu {
 
     signal chosen(string urn)
 
+    /// What is ticked is the store's: a click ticks nothing by itself.
+    function choose(line: PanelMenuItem, urn: string) {
+        line.checked = Qt.binding(() => urn === owner.device)
+        owner.chosen(urn)
+    }
+
     title: qsTr("Device")
 
     PanelMenuItem {
         text: qsTr("None")
         checkable: true
         checked: owner.device === ""
-        onTriggered: owner.chosen("")
+        onTriggered: owner.choose(this, "")
     }
 
     Repeater {
@@ -28,7 +34,7 @@ PanelMenu {
             text: linkedTo !== "" && urn !== owner.device ? qsTr("%1 (%2)").arg(urn).arg(linkedTo) : urn
             checkable: true
             checked: urn === owner.device
-            onTriggered: owner.chosen(urn)
+            onTriggered: owner.choose(this, urn)
         }
         // qmllint enable unqualified
     }

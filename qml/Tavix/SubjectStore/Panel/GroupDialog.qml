@@ -12,8 +12,7 @@ PanelDialog {
         title = head
         deed = action
         name.text = ""
-        open()
-        name.forceActiveFocus()
+        show(name)
     }
 
     acceptText: qsTr("Create")

@@ -11,6 +11,9 @@ Popup {
     property alias cell: grid.delegate
     property alias current: grid.currentIndex
 
+    /// What had the focus, and gets it back.
+    property Item before
+
     signal picked(var choice)
 
     function pick(place: int) {
@@ -20,12 +23,12 @@ Popup {
         close()
     }
 
-    /// Opens with its corner at a point of an item, inside the window.
+    /// Opens with its corner at a point of an item, inside the window, once the menu that asks has closed.
     function openAt(item: Item, x: real, y: real) {
         const point = item.mapToItem(parent, x, y)
         popup.x = Math.max(0, Math.min(point.x, parent.width - width))
         popup.y = Math.max(0, Math.min(point.y, parent.height - height))
-        open()
+        Qt.callLater(popup.open) // qmllint disable
     }
 
     parent: Overlay.overlay
@@ -33,7 +36,12 @@ Popup {
     dim: false
     focus: true
     padding: Theme.margin
+    onAboutToShow: before = parent.Window.activeFocusItem
     onOpened: grid.forceActiveFocus()
+    onClosed: {
+        if (before)
+            before.forceActiveFocus()
+    }
 
     background: Rectangle {
         color: Theme.raised
@@ -71,6 +79,8 @@ Popup {
             highlightMoveDuration: 0
 
             TapHandler {
+                // Grabs the press, which would reach the rows beneath otherwise.
+                gesturePolicy: TapHandler.ReleaseWithinBounds
                 onTapped: eventPoint => popup.pick(grid.indexAt(eventPoint.position.x, eventPoint.position.y))
             }
 

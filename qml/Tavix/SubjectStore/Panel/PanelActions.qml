@@ -17,11 +17,13 @@ QtObject {
     readonly property var selection: panel ? panel.selection : []
     readonly property var ids: panel ? panel.selectedSubjects : []
     readonly property bool any: ids.length > 0
-    /// The flags that some selected subject has.
-    readonly property int kinds: ids.reduce((mask, id) => mask | SubjectStore.subjectFlags(id), 0)
-    readonly property bool objects: (kinds & (SubjectFlags.Rigid | SubjectFlags.Smart)) !== 0
-    readonly property bool smart: (kinds & SubjectFlags.Smart) !== 0
-    readonly property bool characters: (kinds & SubjectFlags.SolvedFromClusters) !== 0
+    readonly property var flags: ids.map(id => SubjectStore.subjectFlags(id))
+    /// A command passes by what it is not for.
+    readonly property var objectIds: ofKind(SubjectFlags.Rigid | SubjectFlags.Smart)
+    readonly property var characterIds: ofKind(SubjectFlags.SolvedFromClusters)
+    readonly property bool objects: objectIds.length > 0
+    readonly property bool smart: flags.some(one => one & SubjectFlags.Smart)
+    readonly property bool characters: characterIds.length > 0
     readonly property int features: SubjectStore.enabledFeatures()
     readonly property string needsSubject: qsTr("Select a subject first.")
     readonly property string needsOne: qsTr("Select one subject first.")
@@ -36,6 +38,11 @@ QtObject {
 
     function has(feature: int): bool {
         return (features & feature) !== 0
+    }
+
+    /// The selected subjects that have one of these flags.
+    function ofKind(mask: int): var {
+        return ids.filter((_, i) => flags[i] & mask)
     }
 
     /// Shows how a command ended; whether it succeeded.
@@ -137,7 +144,7 @@ QtObject {
         text: qsTr("Merge")
         tip: qsTr("Move the clusters to the smart object that was selected first, and remove the others.")
         enabled: (actions.revision, actions.asked && SubjectStore.canMergeSelectedSmartObjects(actions.selection))
-        needs: qsTr("Select two or more smart objects that are not assigned to a slot.")
+        needs: qsTr("Select two or more smart objects.")
         onTriggered: actions.tell(SubjectStore.mergeSelectedSmartObjects(actions.selection))
     }
     readonly property PanelAction split: PanelAction {
@@ -178,13 +185,13 @@ QtObject {
         text: qsTr("Calibrate")
         enabled: actions.characters
         needs: actions.needsCharacter
-        onTriggered: actions.tell(SubjectStore.calibrateCFC(actions.ids))
+        onTriggered: actions.tell(SubjectStore.calibrateCFC(actions.characterIds))
     }
     readonly property PanelAction decalibrate: PanelAction {
         text: qsTr("Remove calibration")
         enabled: actions.characters
         needs: actions.needsCharacter
-        onTriggered: actions.tell(SubjectStore.decalibrateCFC(actions.ids))
+        onTriggered: actions.tell(SubjectStore.decalibrateCFC(actions.characterIds))
     }
 
     readonly property PanelAction unassign: PanelAction {
@@ -204,13 +211,13 @@ QtObject {
         text: qsTr("Assign automatically")
         enabled: actions.objects
         needs: qsTr("Select an object first.")
-        onTriggered: actions.tell(actions.panel.setAutoAssign(actions.ids, true))
+        onTriggered: actions.tell(actions.panel.setAutoAssign(actions.objectIds, true))
     }
     readonly property PanelAction autoAssignOff: PanelAction {
         text: qsTr("Do not assign automatically")
         enabled: actions.objects
         needs: qsTr("Select an object first.")
-        onTriggered: actions.tell(actions.panel.setAutoAssign(actions.ids, false))
+        onTriggered: actions.tell(actions.panel.setAutoAssign(actions.objectIds, false))
     }
 
     readonly property PanelAction exportSubject: PanelAction {

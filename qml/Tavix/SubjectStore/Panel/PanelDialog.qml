@@ -20,6 +20,16 @@ Dialog {
     /// To be answered with `finish`.
     signal committed
 
+    /// Opens with the focus on an item of the form. Not at once: a menu that asks closes first, and with it goes what has
+    /// the focus now.
+    function show(first: Item) {
+        Qt.callLater(() => { // qmllint disable
+            open()
+            if (first)
+                first.forceActiveFocus()
+        })
+    }
+
     function commit() {
         if (acceptable)
             committed()

@@ -6,6 +6,16 @@ import QtQuick.Controls
 Menu {
     id: menu
 
+    /// What had the focus, and gets it back unless a command has given it to something else.
+    property Item before
+
+    function giveBackFocus() {
+        const window = parent ? parent.Window : null
+        if (before && window && (!window.activeFocusItem || window.activeFocusItem === window.contentItem))
+            before.forceActiveFocus()
+        before = null
+    }
+
     function fit() {
         let widest = 12 * Theme.rowHeight / 2
         for (let place = 0; place < count; ++place)
@@ -15,7 +25,12 @@ Menu {
 
     padding: 2
     delegate: PanelMenuItem {}
-    onAboutToShow: fit()
+    onAboutToShow: {
+        fit()
+        // A submenu gives it back to its menu by itself.
+        before = parent instanceof MenuItem ? null : parent.Window.activeFocusItem
+    }
+    onClosed: giveBackFocus()
     background: Rectangle {
         color: Theme.raised
         border.color: Theme.line

@@ -45,7 +45,7 @@ MenuItem {
             x: item.markWidth
             anchors.verticalCenter: parent.verticalCenter
             width: Math.min(implicitWidth, item.width - x - keys.width - 2 * Theme.margin - Theme.iconSize)
-            text: item.text.replace("&", "")
+            text: item.text
             elide: Text.ElideRight
             color: item.colour
             font: item.font

@@ -1,5 +1,6 @@
 import QtQuick
 import QtQuick.Controls
+import Tavix.SubjectStore 1.0
 import Tavix.SubjectStore.Controls 1.0
 
 /// The editor that suits a parameter. `parameter` is a row of a parameter model.
@@ -14,6 +15,7 @@ Loader {
     readonly property string key: parameter.key
     readonly property string label: parameter.label
     readonly property bool editable: parameter.editable === true
+    readonly property bool takesPresets: SubjectStore.objectPresetModel !== null && subject !== null && (SubjectStore.subjectFlags(subject) & (SubjectFlags.Rigid | SubjectFlags.Smart)) !== 0
 
     signal finished(var result)
 
@@ -30,10 +32,11 @@ Loader {
         case "action":
             return state
         }
+        // Not edited itself: choosing a preset applies it.
+        if (key === "Parameters/PresetName" && takesPresets)
+            return preset
         if (!editable)
             return fixed
-        if (key === "Parameters/PresetName")
-            return preset
         return key === "Parameters/Name" || /^Create.*Name$/.test(key) ? name : text
     }
 

@@ -47,7 +47,9 @@ ScrollView {
 
             x: Theme.margin
             y: Theme.margin
-            width: parent.width - 2 * Theme.margin - (pane.contentHeight > pane.height ? Theme.margin : 0)
+            // The scroll bar has its room also while there is none: what is lower when it is narrower, such as a
+            // picture, would bring the bar and take it away without end.
+            width: parent.width - 3 * Theme.margin
             visible: pane.emptyTitle === ""
             spacing: Theme.margin
         }

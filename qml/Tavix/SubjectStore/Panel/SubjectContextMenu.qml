@@ -13,7 +13,7 @@ PanelMenu {
     readonly property var ids: actions.ids
 
     function askGroup(head: string, set: var) {
-        const members = ids
+        const members = actions.objectIds
         actions.dialogs.group.ask(head, name => set(members, name))
     }
 
@@ -58,7 +58,7 @@ PanelMenu {
 
         title: qsTr("Proximity group")
         enabled: owner.actions.objects && owner.actions.has(SubjectStoreFeatures.ProximityGrouping)
-        onGroupChosen: group => owner.actions.tell(owner.panel.setProximityGroup(owner.ids, group))
+        onGroupChosen: group => owner.actions.tell(owner.panel.setProximityGroup(owner.actions.objectIds, group))
         onNewWanted: owner.askGroup(qsTr("New proximity group"), (members, name) => owner.panel.setProximityGroup(members, name))
     }
 
@@ -67,7 +67,7 @@ PanelMenu {
 
         title: qsTr("Template group")
         enabled: owner.actions.objects
-        onGroupChosen: group => owner.actions.tell(owner.panel.setTemplateGroup(owner.ids, group))
+        onGroupChosen: group => owner.actions.tell(owner.panel.setTemplateGroup(owner.actions.objectIds, group))
         onNewWanted: owner.askGroup(qsTr("New template group"), (members, name) => owner.panel.setTemplateGroup(members, name))
     }
 
@@ -86,7 +86,7 @@ PanelMenu {
                 required property var model
 
                 text: model.name
-                onTriggered: owner.actions.tell(owner.panel.applyPreset(model.storeId, owner.ids))
+                onTriggered: owner.actions.tell(owner.panel.applyPreset(model.storeId, owner.actions.objectIds))
             }
             // qmllint enable unqualified
         }

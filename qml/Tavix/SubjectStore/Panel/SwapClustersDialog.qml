@@ -15,8 +15,7 @@ PanelDialog {
         one.currentIndex = 0
         // One object's clusters are swapped with each other.
         other.currentIndex = firstSubject.equals(secondSubject) ? 1 : 0
-        open()
-        one.forceActiveFocus()
+        show(one)
     }
 
     function labels(subject: var): var {
