@@ -83,7 +83,10 @@ void ImportMeshFile(NMX::IStore& store, const std::filesystem::path& file, const
   };
   const auto editor = store.Editor();
   TSubjectStoreId id;
-  check(editor->Add(NMX::ESubjectKind::SceneMeshes, name, id), "the store refuses the subject");
+  const IResult added = editor->Add(NMX::ESubjectKind::SceneMeshes, name, id);
+  if (added == EResult::AlreadyPresent)
+    throw ConfigurationError(file.string() + ": there is a subject " + Files::Quoted(name) + " already", added);
+  check(added, "the store refuses the subject");
   check(editor->SetValue(id, NMX::Paths::FilePath(), path), "the store refuses the path of");
   check(editor->Commit(), "the store cannot keep");
 }

@@ -2,6 +2,9 @@
 
 #include "HostInterface/NMX/GlobalLog.h"
 
+#include <QCoreApplication>
+#include <QEvent>
+
 #include <exception>
 #include <utility>
 
@@ -15,7 +18,7 @@ void VGuiPostalService::Post(std::function<void()> task)
     return;
   m_tasks.push_back(std::move(task));
   if (m_tasks.size() == 1)
-    QMetaObject::invokeMethod(&m_receiver, [this] { Run(); }, Qt::QueuedConnection);
+    QCoreApplication::postEvent(&m_receiver, new QEvent(QEvent::User)); // Qt's from here on
 }
 
 void VGuiPostalService::Stop()

@@ -20,13 +20,26 @@ public:
   void Stop();
 
 private:
+  /// Takes the event that wakes the event loop.
+  class Receiver final : public QObject
+  {
+  public:
+    explicit Receiver(VGuiPostalService& owner) : m_owner(owner) {}
+
+  protected:
+    void customEvent(QEvent* /*event*/) override { m_owner.Run(); }
+
+  private:
+    VGuiPostalService& m_owner;
+  };
+
   /// Runs what has been posted until now; what that posts waits for its turn, so that the event loop gets one.
   void Run();
 
   std::mutex m_mutex;
   std::vector<std::function<void()>> m_tasks;
   bool m_stopped = false;
-  QObject m_receiver; ///< lives on the GUI thread
+  Receiver m_receiver{*this}; ///< lives on the GUI thread
 };
 
 }

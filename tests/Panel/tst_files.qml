@@ -93,7 +93,7 @@ PanelCase {
         compare(stage.names("SceneMeshes"), ["Rock"])
         rowOf("Rock")
         importFile("Import mesh", "Rock.obj")
-        verifyTold("Rock.obj", "AlreadyPresent")
+        verifyTold("Rock.obj", "there is a subject \"Rock\" already")
         stage.writeFile("Rock.txt", "v 0 0 0")
         importFile("Import mesh", "Rock.txt")
         verifyTold("Rock.txt", "this is no mesh by its name")
