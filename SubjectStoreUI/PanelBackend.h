@@ -63,6 +63,13 @@ struct PanelBackend
         });
   }
 
+  /// Whether the rule of an operation is kept at present: `check(reader)`.
+  template <class Check>
+  [[nodiscard]] bool Can(Check check) const
+  {
+    return Subjects::Guarded([&]() -> NMX::IResult { return check(*store->Reader()); }).Succeeded();
+  }
+
   /// An entry that has a value of type `T`; none otherwise, without a word.
   template <class T>
   [[nodiscard]] std::optional<T> Entry(NMX::TSubjectStoreId subject, NMX::EntryPath path) const

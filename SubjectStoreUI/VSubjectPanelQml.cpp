@@ -4,22 +4,17 @@
 #include "HostInterface/IDeviceServices.h"
 #include "HostInterface/ISmartObjectControls.h"
 #include "HostInterface/RunaCorePluginInterface/ICalibrationProvider.h"
-#include "HostInterface/RunaCorePluginInterface/IObjectEvaluationSettings.h"
 #include "HostInterface/RunaCorePluginInterface/IObjectPresetProvider.h"
-#include "RunaCorePluginSubjectStore/Subjects/NameCheck.h"
-#include "RunaCorePluginSubjectStore/Subjects/SlotAssignment.h"
 #include "StoreInterface/ColourText.h"
 #include "StoreInterface/EntryPaths.h"
 #include "SubjectStoreUI/PanelBackend.h"
+#include "SubjectStoreUI/PanelQuestions.h"
 #include "SubjectStoreUI/StoreWatch.h"
 #include "SubjectStoreUI/VDeviceModel.h"
 #include "SubjectStoreUI/VPanelRowsModel.h"
-#include "SubjectStoreUI/WarningGadget.h"
-#include "SubjectStoreUI/WarningTypes.h"
 
-#include <algorithm>
-#include <set>
 #include <utility>
+#include <vector>
 
 namespace SubjectStoreUI
 {
@@ -35,7 +30,6 @@ namespace
 {
 
 constexpr int watchIntervalInMilliseconds = 50;
-constexpr qsizetype maximumNameBytes = 255;
 
 using Clusters = std::vector<NMX::SmartCluster>;
 
@@ -46,39 +40,6 @@ QList<VSortSubjectsProxyModel*> ToSections(const QObjectList& objects)
     if (auto* section = qobject_cast<VSortSubjectsProxyModel*>(object))
       sections.append(section);
   return sections;
-}
-
-/// All objects, basic and smart.
-std::vector<TSubjectStoreId> Objects(const NMX::IStoreReader& access)
-{
-  std::vector<TSubjectStoreId> objects;
-  for (const ESubjectKind kind : {ESubjectKind::BasicObjects, ESubjectKind::SmartObjects})
-  {
-    std::vector<TSubjectStoreId> ofKind;
-    (void)access.Subjects(kind, ofKind);
-    objects.insert(objects.end(), ofKind.begin(), ofKind.end());
-  }
-  return objects;
-}
-
-QString NameOf(const NMX::IStoreReader& access, TSubjectStoreId subject)
-{
-  std::string name;
-  (void)NMX::Read(access, subject, Paths::Name(), name);
-  return QString::fromStdString(name);
-}
-
-/// Sorts maps by the text that they have for a key.
-void SortBy(QVariantList& maps, const QString& key)
-{
-  std::sort(maps.begin(), maps.end(), [&](const QVariant& a, const QVariant& b)
-            { return a.toMap()[key].toString().compare(b.toMap()[key].toString(), Qt::CaseInsensitive) < 0; });
-}
-
-void AppendMarkers(QVariantList& places, const std::vector<NMX::Position>& markers)
-{
-  for (const NMX::Position& marker : markers)
-    places.append(QVariantMap{{"x", marker.x}, {"y", marker.y}, {"z", marker.z}, {"pattern", 0}});
 }
 
 }
@@ -100,17 +61,6 @@ struct VSubjectPanelQml::Implementation
   {
     return backend.EditEach(ToIds(subjects), [&](NMX::IEntryEditor& editor, TSubjectStoreId id)
                             { return editor.SetValue(id, path, text.toStdString(), NMX::ENotify::Yes); });
-  }
-
-  /// The texts that objects have for an entry.
-  [[nodiscard]] QStringList Texts(NMX::EntryPath path) const
-  {
-    std::set<QString> texts;
-    const auto access = backend.store->Reader();
-    for (const TSubjectStoreId id : Objects(*access))
-      if (std::string text; NMX::Read(*access, id, path, text).Succeeded() && !text.empty())
-        texts.insert(QString::fromStdString(text));
-    return {texts.begin(), texts.end()};
   }
 
   /// Edits one cluster: `edit(editor, cluster)`. `InvalidIndex` when it is not there.
@@ -258,23 +208,7 @@ VSelectionItemGadget VSubjectPanelQml::itemOfDevice(const QString& urn) const
 
 QString VSubjectPanelQml::nameProblem(const QString& name, const VStoreIdGadget& subject) const
 {
-  const std::string text = name.toStdString();
-  if (text.empty())
-    return tr("A name is needed.");
-  if (static_cast<qsizetype>(text.size()) > maximumNameBytes)
-    return tr("The name is too long.");
-  const auto access = m_implementation->backend.store->Reader();
-  TSubjectStoreId known;
-  if (access->FindByName(text, known).Succeeded())
-    return known == subject.Id() ? QString() : tr("A subject of that name exists already.");
-  if (text.front() == ' ' || text.back() == ' ')
-    return tr("A name cannot begin or end with a space.");
-  if (Subjects::MatchesPattern(text, access->NamePattern()))
-    return {};
-  for (const QChar character : name)
-    if (QString(R"(/\:*?"<>|)").contains(character))
-      return tr("A name cannot contain \"%1\".").arg(character);
-  return tr("That name is not allowed.");
+  return PanelQuestions::NameProblem(m_implementation->backend, name, subject.Id());
 }
 
 QString VSubjectPanelQml::colour(const VStoreIdGadget& subject) const
@@ -316,12 +250,12 @@ VResultGadget VSubjectPanelQml::setTemplateGroup(const QVariantList& subjects, c
 
 QStringList VSubjectPanelQml::proximityGroups() const
 {
-  return m_implementation->Texts(Paths::ProximityGroupName());
+  return PanelQuestions::Texts(m_implementation->backend, Paths::ProximityGroupName());
 }
 
 QStringList VSubjectPanelQml::templateGroups() const
 {
-  return m_implementation->Texts(Paths::TemplateGroupName());
+  return PanelQuestions::Texts(m_implementation->backend, Paths::TemplateGroupName());
 }
 
 VResultGadget VSubjectPanelQml::setAutoAssign(const QVariantList& subjects, bool on)
@@ -439,80 +373,27 @@ VResultGadget VSubjectPanelQml::rebootDevices(const QStringList& urns)
 
 QVariantList VSubjectPanelQml::candidatesFor(const VSelectionItemGadget& slot) const
 {
-  const auto access = m_implementation->backend.store->Reader();
-  QVariantList candidates;
-  for (const TSubjectStoreId object : Subjects::UnassignedObjects(*access))
-    if (Subjects::CheckAssign(*access, object, slot.Item().subject, static_cast<std::uint32_t>(slot.Slot()))
-            .Succeeded())
-      candidates.append(
-          QVariantMap{{"id", QVariant::fromValue(VStoreIdGadget(object))}, {"name", NameOf(*access, object)}});
-  SortBy(candidates, "name");
-  return candidates;
+  return PanelQuestions::CandidatesFor(m_implementation->backend, slot.Item());
 }
 
 QVariantList VSubjectPanelQml::slotsFor(const VStoreIdGadget& subject) const
 {
-  const auto access = m_implementation->backend.store->Reader();
-  QVariantList places;
-  for (const Subjects::EmptySlot& slot : Subjects::EmptySlots(*access))
-    if (Subjects::CheckAssign(*access, subject.Id(), slot.character, slot.index).Succeeded())
-    {
-      const VSelectionItemGadget item(slot.character, static_cast<int>(slot.index));
-      places.append(
-          QVariantMap{{"item", QVariant::fromValue(item)},
-                      {"name", NameOf(*access, slot.character) + " / " + QString::fromStdString(slot.slot.name)}});
-    }
-  return places;
+  return PanelQuestions::SlotsFor(m_implementation->backend, subject.Id());
 }
 
 QVariantList VSubjectPanelQml::markers(const VStoreIdGadget& subject) const
 {
-  using Positions = std::vector<NMX::Position>;
-  const PanelBackend& backend = m_implementation->backend;
-  QVariantList places;
-  for (const NMX::EntryPath path : {Paths::Markers(), Paths::AdditionalMarkerPositions()})
-    AppendMarkers(places, backend.Entry<Positions>(subject.Id(), path).value_or(Positions{}));
-  return places;
+  return PanelQuestions::Markers(m_implementation->backend, subject.Id());
 }
 
 QVariantList VSubjectPanelQml::confusableWith(const VStoreIdGadget& subject) const
 {
-  const auto evaluation = m_implementation->backend.Get(&IPanelServices::ObjectEvaluationSettings);
-  QVariantList found;
-  if (!evaluation)
-    return found;
-  const auto access = m_implementation->backend.store->Reader();
-  for (const TSubjectStoreId other : Objects(*access))
-  {
-    bool matches = false;
-    double distance = 0;
-    if (evaluation->MatchDistance(*access, subject.Id(), other, matches, distance).Succeeded() && matches)
-      found.append(QVariantMap{{"id", QVariant::fromValue(VStoreIdGadget(other))},
-                               {"name", NameOf(*access, other)},
-                               {"distance", distance}});
-  }
-  std::stable_sort(found.begin(), found.end(), [](const QVariant& a, const QVariant& b)
-                   { return a.toMap()["distance"].toDouble() < b.toMap()["distance"].toDouble(); });
-  return found;
+  return PanelQuestions::ConfusableWith(m_implementation->backend, subject.Id());
 }
 
 QVariantList VSubjectPanelQml::warningsOf(const VStoreIdGadget& subject) const
 {
-  QVariantList warnings;
-  const auto access = m_implementation->backend.store->Reader();
-  const auto types = WarningTypes();
-  for (std::size_t type = 1; type < types.size(); ++type)
-  {
-    const NMX::Value* value = nullptr;
-    (void)access->Find(subject.Id(), NMX::EntryPath("Warnings/" + std::string(types[type].key)), value);
-    const bool* holds = value != nullptr ? std::get_if<bool>(value) : nullptr;
-    if (holds == nullptr || !*holds)
-      continue;
-    const std::string_view text = types[type].ofOne;
-    warnings.append(QVariant::fromValue(
-        VWarningGadget{static_cast<int>(type), QString::fromUtf8(text.data(), static_cast<qsizetype>(text.size()))}));
-  }
-  return warnings;
+  return PanelQuestions::WarningsOf(m_implementation->backend, subject.Id());
 }
 
 }

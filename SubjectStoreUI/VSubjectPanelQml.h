@@ -111,7 +111,9 @@ public:
   /// The empty slots that the object can be put into: an array of {item, name}, "character / slot".
   Q_INVOKABLE [[nodiscard]] QVariantList slotsFor(const SubjectStoreUI::VStoreIdGadget& subject) const;
 
-  /// What is drawn of an object: an array of {x, y, z, pattern} in mm in its own frame; pattern 0 for none.
+  /// What is drawn of an object: an array of {x, y, z, pattern} in mm; pattern 0 for none. Its own markers are in its
+  /// own frame. Those of its clusters are as their device types have them: the first cluster's in that frame too, and,
+  /// as it is not known where the clusters sit, each other cluster's beside the one before it.
   Q_INVOKABLE [[nodiscard]] QVariantList markers(const SubjectStoreUI::VStoreIdGadget& subject) const;
   /// The objects that evaluation has found to match it: an array of {id, name, distance}, the distance in mm, the
   /// closest first.

@@ -1,13 +1,8 @@
 #include "SubjectStoreUI/VSubjectStoreQml.h"
 
-#include "HostInterface/ICharacterControls.h"
-#include "HostInterface/ISmartObjectControls.h"
 #include "HostInterface/RunaCorePluginInterface/IObjectEvaluationSettings.h"
 #include "HostInterface/RunaCorePluginInterface/IPluginSettings.h"
-#include "RunaCorePluginSubjectStore/Subjects/ClusterEdits.h"
-#include "RunaCorePluginSubjectStore/Subjects/SlotAssignment.h"
 #include "StoreInterface/EntryPaths.h"
-#include "StoreUI/ResultSentence.h"
 #include "SubjectStoreUI/ObjectEvaluationWatch.h"
 #include "SubjectStoreUI/PanelBackend.h"
 #include "SubjectStoreUI/PanelParameters.h"
@@ -90,13 +85,6 @@ struct VSubjectStoreQml::Implementation
   {
     const auto subjects = backend.SelectedSubjects();
     return subjects.empty() ? TSubjectStoreId{} : subjects.front();
-  }
-
-  /// Whether a rule of an operation is kept at present.
-  template <class Check>
-  [[nodiscard]] bool Can(Check check) const
-  {
-    return Subjects::Guarded([&]() -> IResult { return check(*backend.store->Reader()); }).Succeeded();
   }
 
   [[nodiscard]] VResultGadget SetModelOutput(const QString& name, bool on)
@@ -317,166 +305,6 @@ QString VSubjectStoreQml::smartClusterLabel(const VStoreIdGadget& i_SubjectStore
   const auto clusters = m_implementation->backend.Entry<Clusters>(i_SubjectStoreId.Id(), Paths::SmartClusters());
   const auto index = static_cast<std::size_t>(i_SmartClusterIndex); // of a negative index far past the end
   return clusters && index < clusters->size() ? QString::fromStdString((*clusters)[index].label) : QString();
-}
-
-bool VSubjectStoreQml::canCreateSmartObjects(const QVariantList& i_SelectionItems) const
-{
-  const auto controls = m_implementation->backend.Get(&IPanelServices::SmartObjectControls);
-  std::vector<std::string> names;
-  return controls &&
-         controls->CreateForDevices(DevicesOf(ToItems(i_SelectionItems)), ISmartObjectControls::ECreate::No, names)
-             .Succeeded();
-}
-
-VResultGadget VSubjectStoreQml::createSmartObjects(const QVariantList& i_SelectionItems)
-{
-  const auto controls = m_implementation->backend.Get(&IPanelServices::SmartObjectControls);
-  if (!controls)
-    return IResult(EResult::NotAvailable);
-  std::vector<std::string> names;
-  const IResult created =
-      controls->CreateForDevices(DevicesOf(ToItems(i_SelectionItems)), ISmartObjectControls::ECreate::Yes, names);
-  if (created == EResult::InvalidArgument)
-    return {created, "No device is selected."};
-  if (created == EResult::AlreadyPresent)
-    return {created, "A device is linked to a smart object already."};
-  if (created == EResult::NotFound)
-    return {created, "There is no smart object for that type of device."};
-  TSubjectStoreId first;
-  if (created.Succeeded() && !names.empty() &&
-      m_implementation->backend.store->Reader()->FindByName(names.front(), first).Succeeded())
-    Q_EMIT focusSubject(VStoreIdGadget(first));
-  return created;
-}
-
-VResultGadget VSubjectStoreQml::assignOptimalActiveMarkerPatterns(const QVariantList& /*i_SelectionItems*/)
-{
-  const auto controls = m_implementation->backend.Get(&IPanelServices::SmartObjectControls);
-  if (!controls)
-    return IResult(EResult::NotAvailable);
-  const IResult assigned = controls->AssignOptimalPatterns();
-  return {assigned, StoreUI::PatternSentence(assigned)};
-}
-
-bool VSubjectStoreQml::canMergeSelectedSmartObjects(const QVariantList& i_SelectionItems) const
-{
-  const auto objects = SubjectsOf(ToItems(i_SelectionItems));
-  return m_implementation->Can([&](const NMX::IStoreReader& access) { return Subjects::CheckMerge(access, objects); });
-}
-
-VResultGadget VSubjectStoreQml::mergeSelectedSmartObjects(const QVariantList& i_SelectionItems)
-{
-  const auto objects = SubjectsOf(ToItems(i_SelectionItems));
-  return m_implementation->backend.Edit([&](NMX::IEntryEditor& editor) { return Subjects::Merge(editor, objects); });
-}
-
-bool VSubjectStoreQml::canSplitSelectedSmartObjects(const QVariantList& i_SelectionItems) const
-{
-  const auto objects = SubjectsOf(ToItems(i_SelectionItems));
-  return m_implementation->Can([&](const NMX::IStoreReader& access) { return Subjects::CheckSplit(access, objects); });
-}
-
-VResultGadget VSubjectStoreQml::splitSelectedSmartObjects(const QVariantList& i_SelectionItems)
-{
-  const auto objects = SubjectsOf(ToItems(i_SelectionItems));
-  return m_implementation->backend.Edit([&](NMX::IEntryEditor& editor) { return Subjects::Split(editor, objects); });
-}
-
-bool VSubjectStoreQml::canSwapSmartClusters(const VStoreIdGadget& i_FirstSubjectId,
-                                            const VStoreIdGadget& i_SecondSubjectId) const
-{
-  return m_implementation->Can([&](const NMX::IStoreReader& access)
-                               { return Subjects::CheckSwap(access, i_FirstSubjectId.Id(), i_SecondSubjectId.Id()); });
-}
-
-VResultGadget VSubjectStoreQml::swapSmartClusters(const VStoreIdGadget& i_FirstSubjectId,
-                                                  const VStoreIdGadget& i_SecondSubjectId, int i_FirstClusterIndex,
-                                                  int i_SecondClusterIndex)
-{
-  return m_implementation->backend.Edit(
-      [&](NMX::IEntryEditor& editor)
-      {
-        // A negative index becomes one far past the end.
-        return Subjects::Swap(editor, i_FirstSubjectId.Id(), static_cast<std::uint32_t>(i_FirstClusterIndex),
-                              i_SecondSubjectId.Id(), static_cast<std::uint32_t>(i_SecondClusterIndex));
-      });
-}
-
-VResultGadget VSubjectStoreQml::calibrateCFC(const QVariantList& i_SubjectStoreIds)
-{
-  const auto controls = m_implementation->backend.Get(&IPanelServices::CharacterControls);
-  if (!controls)
-    return IResult(EResult::NotAvailable);
-  return m_implementation->backend.EditEach(ToIds(i_SubjectStoreIds),
-                                            [&](NMX::IEntryEditor& editor, TSubjectStoreId id)
-                                            {
-                                              const IResult is = Subjects::MustBeCharacter(editor, id);
-                                              return is.Failed() ? is : controls->Calibrate(editor, id);
-                                            });
-}
-
-VResultGadget VSubjectStoreQml::decalibrateCFC(const QVariantList& i_SubjectStoreIds)
-{
-  const auto controls = m_implementation->backend.Get(&IPanelServices::CharacterControls);
-  if (!controls)
-    return IResult(EResult::NotAvailable);
-  return m_implementation->backend.EditEach(ToIds(i_SubjectStoreIds),
-                                            [&](NMX::IEntryEditor& editor, TSubjectStoreId id)
-                                            {
-                                              const IResult is = Subjects::MustBeCharacter(editor, id);
-                                              return is.Failed() ? is : controls->ClearCalibration(editor, id);
-                                            });
-}
-
-bool VSubjectStoreQml::canAssignSubjectToSlot(const VStoreIdGadget& i_SubjectStoreId,
-                                              const VSelectionItemGadget& i_EmptySubjectSlotSelectionItem) const
-{
-  const SelectionItem& slot = i_EmptySubjectSlotSelectionItem.Item();
-  return m_implementation->Can(
-      [&](const NMX::IStoreReader& access)
-      {
-        return Subjects::CheckAssign(access, i_SubjectStoreId.Id(), slot.subject,
-                                     static_cast<std::uint32_t>(slot.slot));
-      });
-}
-
-VResultGadget VSubjectStoreQml::assignSubjectToSlot(const VStoreIdGadget& i_SubjectStoreId,
-                                                    const VSelectionItemGadget& i_EmptySubjectSlotSelectionItem)
-{
-  const SelectionItem& slot = i_EmptySubjectSlotSelectionItem.Item();
-  return m_implementation->backend.Edit(
-      [&](NMX::IEntryEditor& editor)
-      { return Subjects::Assign(editor, i_SubjectStoreId.Id(), slot.subject, static_cast<std::uint32_t>(slot.slot)); });
-}
-
-bool VSubjectStoreQml::canUnassignSubjects(const QVariantList& i_SubjectStoreIds) const
-{
-  const auto objects = ToIds(i_SubjectStoreIds);
-  return m_implementation->Can([&](const NMX::IStoreReader& access)
-                               { return Subjects::CheckUnassign(access, objects); });
-}
-
-VResultGadget VSubjectStoreQml::unassignSubjects(const QVariantList& i_SubjectStoreIds)
-{
-  const auto objects = ToIds(i_SubjectStoreIds);
-  return m_implementation->backend.Edit([&](NMX::IEntryEditor& editor) { return Subjects::Unassign(editor, objects); });
-}
-
-bool VSubjectStoreQml::anySubjectManuallyAssignable() const
-{
-  const auto access = m_implementation->backend.store->Reader();
-  return !Subjects::UnassignedObjects(*access).empty() && !Subjects::EmptySlots(*access).empty();
-}
-
-bool VSubjectStoreQml::canDetachClusters(const QVariantList& i_SubjectStoreIds) const
-{
-  return canUnassignSubjects(i_SubjectStoreIds);
-}
-
-VResultGadget VSubjectStoreQml::detachClusters(const QVariantList& i_SubjectStoreIds)
-{
-  const auto objects = ToIds(i_SubjectStoreIds);
-  return m_implementation->backend.Edit([&](NMX::IEntryEditor& editor) { return Subjects::Detach(editor, objects); });
 }
 
 VResultGadget VSubjectStoreQml::addModel(const QString& i_ModelName)

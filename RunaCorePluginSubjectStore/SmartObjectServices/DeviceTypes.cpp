@@ -56,6 +56,14 @@ void RegisterDeviceTypes(RunaCorePluginInterface::IDeviceLayoutRegistry& registr
   registry.Register(VelaParkHeadsetV1());
 }
 
+std::span<const MarkerPlace> MarkersOf(std::string_view type)
+{
+  for (const DeviceLayout* layout : {&Corvex1(), &Quarex10(), &VelaParkHeadsetV1()})
+    if (layout->type == type)
+      return layout->markers;
+  return {};
+}
+
 const std::vector<std::string>& CompatibleDeviceTypes()
 {
   // The host knows the others, but no smart object can be made of them.

@@ -20,8 +20,8 @@ const std::map<std::string, std::set<std::string>> allowed{
 
     {"StoreUI", {"HostInterface", "StoreInterface"}},
     {"SubjectStoreUI",
-     {"StoreUI", "RunaCorePluginSubjectStore/Subjects", "RunaCorePluginSubjectStore/SubjectCalibrationServices",
-      "HostInterface", "StoreInterface"}},
+     {"StoreUI", "RunaCorePluginSubjectStore/Subjects", "RunaCorePluginSubjectStore/SmartObjectServices",
+      "RunaCorePluginSubjectStore/SubjectCalibrationServices", "HostInterface", "StoreInterface"}},
 
     {"RunaCorePluginSubjectStore/Subjects", {"HostInterface", "StoreInterface"}},
     {"RunaCorePluginSubjectStore/BasicObjectServices",

@@ -563,3 +563,26 @@ TEST_F(PanelTest, CalibrationSaysWhatIsPossibleAndWhyNot)
   EXPECT_EQ(calibration.lastResult(), "The last calibration was completed.");
   provider->Stop();
 }
+
+TEST_F(PanelTest, MarkersOfClustersAreThoseOfTheirTypesInTheirPatterns)
+{
+  QQmlEngine engine;
+  MakePanel(0xFFFFFFFF, engine.rootContext());
+  const auto& work = *engine.rootContext()->contextProperty("rootContextSubjectPanel").value<VSubjectPanelQml*>();
+  const Id glove = Add(ESubjectKind::SmartObjects, "Glove");
+  Set(glove, Paths::AdditionalMarkerPositions(), std::vector<NMX::Position>{{1, 2, 3}});
+  Set(glove, Paths::SmartClusters(),
+      std::vector<NMX::SmartCluster>{
+          {"Back", "", 5, "Corvex1"}, {"Odd", "", 1, "Unknown"}, {"Palm", "", 7, "Corvex1"}});
+  const QVariantList markers = work.markers(VStoreIdGadget(glove));
+  ASSERT_EQ(markers.size(), 17);
+  const auto of = [&](int marker, const char* key) { return markers[marker].toMap()[key].toDouble(); };
+  EXPECT_EQ(of(0, "x"), 1);
+  EXPECT_EQ(of(0, "pattern"), 0);
+  EXPECT_EQ(of(1, "x"), -1.75);
+  EXPECT_EQ(of(1, "pattern"), 5);
+  EXPECT_EQ(of(9, "pattern"), 7);
+  EXPECT_EQ(of(9, "y"), of(1, "y"));
+  EXPECT_DOUBLE_EQ(of(9, "x") - of(1, "x"), 24.25 + 24.25 + 30) << "beside the first";
+  EXPECT_THAT(work.markers(VStoreIdGadget()), IsEmpty());
+}

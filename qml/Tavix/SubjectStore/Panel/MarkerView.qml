@@ -1,5 +1,6 @@
 import QtQuick
 import QtQuick.Controls
+import Tavix.SubjectStore 1.0
 import "MarkerProjection.js" as Projection
 
 /// The markers of an object in space, and beneath them the objects that it can be confused with. Choosing one of these
@@ -35,6 +36,14 @@ Column {
         name: view.name
         markers: view.markers
         rings: view.comparedMatch ? Projection.centredOn(view.panel.markers(view.comparedMatch.id), view.markers) : []
+    }
+    Label {
+        width: parent.width
+        visible: view.subject !== null && (view.panel.revision, SubjectStore.smartClusterCount(view.subject) > 1)
+        text: qsTr("Clusters side by side: where they sit on the object is not known.")
+        color: Theme.secondaryText
+        font.pixelSize: Theme.smallFont
+        wrapMode: Text.Wrap
     }
     PaneHeading {
         width: parent.width
