@@ -1,6 +1,7 @@
 #pragma once
 
 #include "StandaloneHost/Server/Dispatcher.h"
+#include "StandaloneHost/Server/Documents.h"
 #include "StandaloneHost/Server/Notifier.h"
 #include "StandaloneHost/Server/VServer.h"
 
@@ -81,6 +82,7 @@ struct Core
   Registry registry;
   Notifier notifier;
   Dispatcher dispatcher;
+  Documents documents;
   Connections connections;
   std::uint64_t lastSession = 0;
   bool closing = false;

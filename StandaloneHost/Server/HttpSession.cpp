@@ -28,12 +28,6 @@ constexpr auto idleTime = std::chrono::seconds(60);
 constexpr auto transferTime = std::chrono::seconds(30);
 constexpr auto closingTime = std::chrono::seconds(2);
 
-constexpr std::string_view page =
-    "<!DOCTYPE html><html lang=\"en\"><meta charset=\"utf-8\"><title>Subject store</title>"
-    "<h1>Subject store</h1><p>This is the remote-control server of a subject store. It speaks JSON-RPC 2.0: "
-    "<code>POST /rpc</code>, or a WebSocket at <code>/rpc</code>. "
-    "<a href=\"/openrpc.json\">openrpc.json</a> describes every function and callback.</p></html>\n";
-
 /// What a refused visitor is told.
 std::pair<http::status, std::string_view> Refusal(EAdmission admission)
 {
@@ -187,14 +181,12 @@ private:
         return Call();
       return RespondWithAllow("POST, OPTIONS", "Calls are posted; a GET needs a WebSocket upgrade.\n");
     }
-    if (target != "/openrpc.json" && target != "/")
+    const Document* document = m_core->documents.Find(target);
+    if (document == nullptr)
       return Respond(http::status::not_found, "text/plain; charset=utf-8", "There is nothing here.\n");
     if (method != http::verb::get)
       return RespondWithAllow("GET, OPTIONS", "This can only be read.\n");
-    if (target == "/")
-      Respond(http::status::ok, "text/html; charset=utf-8", std::string(page));
-    else
-      Respond(http::status::ok, "application/json", m_core->dispatcher.Description());
+    Respond(http::status::ok, document->type, document->text);
   }
 
   void Call()

@@ -34,6 +34,12 @@ constexpr auto closingTick = std::chrono::milliseconds(10);
 constexpr auto closingTime = std::chrono::milliseconds(1500);
 constexpr auto acceptPause = std::chrono::milliseconds(100);
 
+constexpr std::string_view page =
+    "<!DOCTYPE html><html lang=\"en\"><meta charset=\"utf-8\"><title>Subject store</title>"
+    "<h1>Subject store</h1><p>This is the remote-control server of a subject store. It speaks JSON-RPC 2.0: "
+    "<code>POST /rpc</code>, or a WebSocket at <code>/rpc</code>. "
+    "<a href=\"/openrpc.json\">openrpc.json</a> describes every function and callback.</p></html>\n";
+
 /// A text that no other start of a host has.
 std::string NewEpoch()
 {
@@ -55,6 +61,13 @@ struct VServer::State : std::enable_shared_from_this<State>
       : postal(std::move(service)), core(std::make_shared<Core>(std::move(options), NewEpoch())),
         acceptor(postal->Context().get_executor()), timer(postal->Context())
   {
+  }
+
+  /// Everything has been registered.
+  void AddDocuments() const
+  {
+    core->documents.Add({"/", "text/html; charset=utf-8", std::string(page), true});
+    core->documents.Add({"/openrpc.json", "application/json", core->dispatcher.Description()});
   }
 
   void Accept()
@@ -200,6 +213,7 @@ void VServer::Open()
   }
   const bool isV6 = options.address.find(':') != std::string::npos;
   m_state->address = (isV6 ? '[' + options.address + ']' : options.address) + ':' + std::to_string(m_state->port);
+  m_state->AddDocuments();
   m_state->open = true;
   asio::post(m_state->postal->Context(),
              [state = m_state]
