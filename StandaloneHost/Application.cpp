@@ -86,7 +86,7 @@ public:
 };
 
 /// Tells whoever started the host that calls are served. The file appears whole.
-void WriteReadyFile(const std::filesystem::path& file, const std::string& address)
+void WriteReadyFile(const std::filesystem::path& file, const Server::VServer& server)
 {
   if (file.empty())
     return;
@@ -94,7 +94,7 @@ void WriteReadyFile(const std::filesystem::path& file, const std::string& addres
   unfinished += ".unfinished";
   {
     std::ofstream out(unfinished);
-    out << "{\"url\": \"http://" << address << "\", \"ws\": \"ws://" << address << "/rpc\", \"pid\": " << getpid()
+    out << "{\"url\": \"" << server.Url() << "\", \"ws\": \"" << server.WebSocketUrl() << "\", \"pid\": " << getpid()
         << "}\n";
     out.flush();
     if (!out)
@@ -203,10 +203,10 @@ void RegisterWith(Window::VWindow& window, RunaCorePluginInterface::IPlugin& plu
 }
 
 /// Tells whoever started the host that calls are served.
-void AnnounceAddress(const Options& options, const std::string& address)
+void AnnounceAddress(const Options& options, const Server::VServer& server)
 {
-  WriteReadyFile(options.readyFile, address);
-  std::printf("listening on http://%s and ws://%s/rpc\n", address.c_str(), address.c_str());
+  WriteReadyFile(options.readyFile, server);
+  std::printf("listening on %s and %s\n", server.Url().c_str(), server.WebSocketUrl().c_str());
   std::fflush(stdout);
 }
 
@@ -231,7 +231,7 @@ void Run(Parts& parts, const Options& options, Window::VLogModel* log)
   parts.server->Open();
   if (parts.window)
     parts.window->Show(*parts.server, [&plugin = *parts.plugin] { return plugin.CanClose(); });
-  AnnounceAddress(options, parts.server->Address());
+  AnnounceAddress(options, *parts.server);
   QCoreApplication::exec();
 }
 

@@ -4,6 +4,7 @@
 #include <boost/program_options.hpp>
 #include <boost/regex.hpp>
 
+#include <algorithm>
 #include <array>
 #include <charconv>
 #include <cstdlib>
@@ -77,17 +78,34 @@ void CheckOrigin(const std::string& origin)
         Quoted(origin));
 }
 
+/// The first line of a file: what fits into a header, so that every client can present it.
 std::string ReadToken(const std::filesystem::path& file)
 {
+  constexpr std::size_t longest = 512;
   std::ifstream in(file);
-  std::string token;
-  if (!std::filesystem::is_regular_file(file) || !std::getline(in, token))
+  std::string token(longest + 2, '\0');
+  if (!std::filesystem::is_regular_file(file) || !in)
     throw OptionError("--token-file: cannot read a token from " + Quoted(file.string()));
+  in.read(token.data(), static_cast<std::streamsize>(token.size()));
+  token.resize(static_cast<std::size_t>(in.gcount()));
+  token.resize(std::min(token.find('\n'), token.size()));
   while (!token.empty() && (token.back() == '\r' || token.back() == ' '))
     token.pop_back();
   if (token.empty())
     throw OptionError("--token-file: the first line of " + Quoted(file.string()) + " is empty");
+  const bool fits = std::all_of(token.begin(), token.end(), [](char c) { return c >= ' ' && c <= '~'; });
+  if (!fits || token.front() == ' ' || token.size() > longest)
+    throw OptionError("--token-file: the first line of " + Quoted(file.string()) + " is not up to " +
+                      std::to_string(longest) + " printable ASCII characters");
   return token;
+}
+
+std::chrono::seconds PingTime(const std::string& text)
+{
+  const auto seconds = ParseNumber<std::uint16_t>(text, "ping-after");
+  if (seconds == 0 || seconds > 3600)
+    throw OptionError("--ping-after: expected 1 to 3600 seconds, got " + Quoted(text));
+  return std::chrono::seconds(seconds);
 }
 
 std::filesystem::path UserDataFolder()
@@ -116,10 +134,13 @@ po::options_description Description()
        "folder in which the store is kept, or :memory: to keep nothing (default: the user's data folder)") //
       ("listen", text("127.0.0.1:8420"), "ADDRESS:PORT to serve; port 0 takes a free one")                 //
       ("token-file", po::value<std::string>(),
-       "clients must present the token in this file; required unless the address is loopback") //
-      ("allow-origin", texts(), "origin of a web page that may connect (repeatable)")          //
-      ("features", text("0xFFFFFFFF"), "feature mask, decimal or 0x...")                       //
-      ("level", text("2"), "2, or 1 to open the preview functions as well")                    //
+       "clients must present the token in this file; required unless the address is loopback")                       //
+      ("tls-cert", po::value<std::string>(), "PEM file with the certificate: serves https and wss; needs --tls-key") //
+      ("tls-key", po::value<std::string>(), "PEM file with the certificate's private key")                           //
+      ("allow-origin", texts(), "origin of a web page that may connect (repeatable)")                                //
+      ("ping-after", text("30"), "seconds of silence after which a WebSocket client is pinged")                      //
+      ("features", text("0xFFFFFFFF"), "feature mask, decimal or 0x...")                                             //
+      ("level", text("2"), "2, or 1 to open the preview functions as well")                                          //
       ("character-calibration-time", text("3000"),
        "how long the calibration of a character takes, in ms")                                     //
       ("t-pose-time", text("60000"), "how long a subject calibration waits for the T-pose, in ms") //
@@ -181,6 +202,11 @@ Request ReadOptions(int argumentCount, const char* const* arguments)
     throw OptionError("--listen: " + options.server.address +
                       " can be reached from other machines, so a token is "
                       "required: --token-file FILE");
+  options.server.tlsCertificate = given("tls-cert");
+  options.server.tlsKey = given("tls-key");
+  if (options.server.tlsCertificate.empty() != options.server.tlsKey.empty())
+    throw OptionError("--tls-cert and --tls-key: one needs the other");
+  options.server.limits.pingAfter = PingTime(given("ping-after"));
   options.server.allowedOrigins = list("allow-origin");
   for (const std::string& origin : options.server.allowedOrigins)
     CheckOrigin(origin);

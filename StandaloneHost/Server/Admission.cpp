@@ -1,6 +1,8 @@
 #include "StandaloneHost/Server/Admission.h"
 
 #include <boost/asio/ip/address.hpp>
+#include <openssl/crypto.h>
+#include <openssl/evp.h>
 
 #include <algorithm>
 #include <string>
@@ -11,13 +13,53 @@ namespace Server
 namespace
 {
 
-/// Compares in a time that does not tell how much of the text is right.
+/// Calls `step` for each element of a header's list until it answers true, and answers whether it did.
+template <class Step>
+bool AnyOf(std::string_view list, Step step)
+{
+  constexpr std::string_view blank = " \t";
+  while (!list.empty())
+  {
+    const std::string_view rest = list.substr(std::min(list.find(','), list.size()));
+    std::string_view element = list.substr(0, list.size() - rest.size());
+    element.remove_prefix(std::min(element.find_first_not_of(blank), element.size()));
+    element.remove_suffix(element.size() - (element.find_last_not_of(blank) + 1));
+    if (step(element))
+      return true;
+    list = rest.substr(rest.empty() ? 0 : 1);
+  }
+  return false;
+}
+
+/// Base64 for URLs, without padding.
+std::string Base64Url(std::string_view bytes)
+{
+  std::string text(4 * ((bytes.size() + 2) / 3) + 1, '\0');
+  const int size =
+      EVP_EncodeBlock(reinterpret_cast<unsigned char*>(text.data()),
+                      reinterpret_cast<const unsigned char*>(bytes.data()), static_cast<int>(bytes.size()));
+  text.resize(static_cast<std::size_t>(size));
+  std::replace(text.begin(), text.end(), '+', '-');
+  std::replace(text.begin(), text.end(), '/', '_');
+  text.resize(text.find_last_not_of('=') + 1);
+  return text;
+}
+
+/// Compares in a time that tells no more than whether the length is right.
 bool SameSecret(std::string_view given, std::string_view secret)
 {
-  unsigned difference = given.size() == secret.size() ? 0 : 1;
-  for (std::size_t i = 0; i < given.size(); ++i)
-    difference |= static_cast<unsigned char>(given[i]) ^ static_cast<unsigned char>(secret[i % secret.size()]);
-  return difference == 0;
+  return given.size() == secret.size() && CRYPTO_memcmp(given.data(), secret.data(), secret.size()) == 0;
+}
+
+bool PresentsToken(const Visitor& visitor, const std::string& token)
+{
+  constexpr std::string_view scheme = "Bearer ";
+  if (visitor.authorisation.starts_with(scheme))
+    return SameSecret(visitor.authorisation.substr(scheme.size()), token);
+  constexpr std::string_view prefix = "bearer.";
+  const std::string encoded = visitor.protocols.empty() ? std::string{} : Base64Url(token);
+  return AnyOf(visitor.protocols, [&](std::string_view protocol)
+               { return protocol.starts_with(prefix) && SameSecret(protocol.substr(prefix.size()), encoded); });
 }
 
 /// The host of "host:port" or "[address]:port".
@@ -37,27 +79,29 @@ bool IsOwnHost(std::string_view host)
   return !error || name == "localhost";
 }
 
-bool IsOwnOrigin(std::string_view origin, std::string_view host)
+bool IsOwnOrigin(std::string_view origin, std::string_view host, bool encrypted)
 {
-  return origin == "http://" + std::string(host);
+  return origin == (encrypted ? "https://" : "http://") + std::string(host);
 }
 
 }
 
 EAdmission Admit(const Visitor& visitor, const ServerOptions& options)
 {
-  constexpr std::string_view scheme = "Bearer ";
-  if (!options.token.empty() && !visitor.preflight &&
-      (!visitor.authorisation.starts_with(scheme) ||
-       !SameSecret(visitor.authorisation.substr(scheme.size()), options.token)))
+  if (!options.token.empty() && !visitor.open && !PresentsToken(visitor, options.token))
     return EAdmission::NoToken;
   if (options.token.empty() && !visitor.host.empty() && !IsOwnHost(visitor.host))
     return EAdmission::WrongHost;
   const auto& allowed = options.allowedOrigins;
-  if (!visitor.origin.empty() && !IsOwnOrigin(visitor.origin, visitor.host) &&
+  if (!visitor.origin.empty() && !IsOwnOrigin(visitor.origin, visitor.host, options.Encrypted()) &&
       std::find(allowed.begin(), allowed.end(), visitor.origin) == allowed.end())
     return EAdmission::WrongOrigin;
   return EAdmission::Welcome;
+}
+
+bool OffersProtocol(std::string_view protocols)
+{
+  return AnyOf(protocols, [](std::string_view protocol) { return protocol == webSocketProtocol; });
 }
 
 }

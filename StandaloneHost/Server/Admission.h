@@ -13,7 +13,8 @@ struct Visitor
   std::string_view host;          ///< header Host
   std::string_view origin;        ///< header Origin; empty unless a web page asks
   std::string_view authorisation; ///< header Authorization
-  bool preflight = false;         ///< a browser's question whether a page may ask; carries no token
+  std::string_view protocols{};   ///< header Sec-WebSocket-Protocol: a web page's WebSocket cannot set the other
+  bool open = false;              ///< asks for what everybody may have, such as the page that asks for the token
 };
 
 enum class EAdmission
@@ -26,5 +27,11 @@ enum class EAdmission
 
 /// Decides whether a request is let in. Nothing of the request has been carried out yet. [any]
 [[nodiscard]] EAdmission Admit(const Visitor& visitor, const ServerOptions& options);
+
+/// The WebSocket protocol that is spoken here, whatever else a client offers.
+inline constexpr std::string_view webSocketProtocol = "subject-store";
+
+/// Whether a list of WebSocket protocols, separated by commas, has the one that is spoken here. [any]
+[[nodiscard]] bool OffersProtocol(std::string_view protocols);
 
 }

@@ -1,7 +1,7 @@
 #pragma once
 
-#include <boost/asio/io_context.hpp>
-#include <boost/asio/ip/tcp.hpp>
+#include "StandaloneHost/Server/ClientStream.h"
+
 #include <boost/asio/post.hpp>
 #include <boost/asio/write.hpp>
 #include <boost/beast/core/bind_handler.hpp>
@@ -20,38 +20,33 @@
 namespace Server
 {
 
-/// A TCP socket on a concrete executor: a type-erased one costs at each operation.
-using Socket = boost::asio::basic_stream_socket<boost::asio::ip::tcp, boost::asio::io_context::executor_type>;
-
-/// A stream between a WebSocket and its socket that gathers what is to be sent, because one system call for each
+/// A stream between a WebSocket and its client that gathers what is to be sent, because one system call for each
 /// message costs more than all the rest of answering it.
 ///
 /// A write is done as soon as it has been copied. What has gathered is sent in one go when everything that has been
-/// received is worked through (the reader asks the socket for more, and whatever is ready to run has run), when Flush
-/// is called, or when much has gathered. While too much is still being sent, there is no room for more. [server]
+/// received is worked through (the reader asks the client's stream for more, and whatever is ready to run has run),
+/// when Flush is called, or when much has gathered. While too much is still being sent, there is no room for more.
+/// [server]
 class CoalescingStream
 {
 public:
   using executor_type = boost::asio::io_context::executor_type;
-  using next_layer_type = Socket;
+  using next_layer_type = ClientStream;
   using error_code = boost::system::error_code;
 
-  explicit CoalescingStream(Socket socket) : m_state(std::make_shared<State>(std::move(socket))) {}
+  explicit CoalescingStream(ClientStream client) : m_state(std::make_shared<State>(std::move(client))) {}
   CoalescingStream(CoalescingStream&&) = default;
   CoalescingStream& operator=(CoalescingStream&&) = default;
 
   ~CoalescingStream()
   {
     if (m_state)
-    {
-      error_code ignored;
-      m_state->socket.close(ignored);
-    }
+      m_state->client.close();
   }
 
-  executor_type get_executor() noexcept { return m_state->socket.get_executor(); }
-  next_layer_type& next_layer() { return m_state->socket; }
-  const next_layer_type& next_layer() const { return m_state->socket; }
+  executor_type get_executor() noexcept { return m_state->client.get_executor(); }
+  next_layer_type& next_layer() { return m_state->client; }
+  const next_layer_type& next_layer() const { return m_state->client; }
 
   /// To be called when a message has arrived: what is sent from now on gathers until the reader asks for more.
   void InputArrived() { m_state->inputDrained = false; }
@@ -63,6 +58,9 @@ public:
   void FlushSoon() { State::FlushSoon(m_state); }
 
   [[nodiscard]] bool HasRoom() const { return m_state->HasRoom(); }
+
+  /// Whether the client has sent something, or taken over much, since this was last asked.
+  [[nodiscard]] bool TakeSignOfLife() { return std::exchange(m_state->signOfLife, false); }
 
   /// Calls `task` once there is room again, or nothing can be sent any more.
   void WhenRoom(std::function<void()> task)
@@ -83,12 +81,21 @@ public:
       Flush();
   }
 
+  /// Asks the client for a sign of life.
+  void GatherPing()
+  {
+    m_state->gathered += std::string_view("\x89\0", 2);
+    FlushSoon();
+  }
+
   template <class Buffers, class Handler>
   auto async_read_some(const Buffers& buffers, Handler&& handler)
   {
+    // More is asked for once something has come.
+    m_state->signOfLife = true;
     m_state->inputDrained = true;
     FlushSoon();
-    return m_state->socket.async_read_some(buffers, std::forward<Handler>(handler));
+    return m_state->client.async_read_some(buffers, std::forward<Handler>(handler));
   }
 
   template <class Buffers, class Handler>
@@ -109,11 +116,7 @@ public:
     auto held = std::make_shared<std::decay_t<Handler>>(std::forward<Handler>(handler));
     m_state->teardownDeadline = std::chrono::steady_clock::now() + teardownTime;
     m_state->whenDrained = [state = m_state.get(), held]
-    {
-      error_code ignored;
-      state->socket.shutdown(Socket::shutdown_send, ignored);
-      Discard(state->shared_from_this(), [held] { (*held)(error_code{}); });
-    };
+    { state->client.async_end([kept = state->shared_from_this(), held] { (*held)(error_code{}); }); };
     if (m_state->sending || !m_state->gathered.empty())
       Flush();
     else
@@ -126,12 +129,11 @@ public:
 private:
   static constexpr std::size_t sendAt = std::size_t{64} << 10;
   static constexpr std::size_t waitAt = std::size_t{256} << 10;
-  static constexpr std::size_t discardAtOnce = std::size_t{64} << 10;
   static constexpr auto teardownTime = std::chrono::seconds(2);
 
   struct State : std::enable_shared_from_this<State>
   {
-    explicit State(Socket s) : socket(std::move(s)) {}
+    explicit State(ClientStream stream) : client(std::move(stream)) {}
 
     [[nodiscard]] bool HasRoom() const { return gathered.size() <= waitAt; }
 
@@ -150,7 +152,7 @@ private:
       const std::size_t size = error ? 0 : Append(buffers);
       if (inputDrained || gathered.size() >= sendAt)
         FlushSoon(shared_from_this());
-      boost::asio::post(socket.get_executor(), boost::beast::bind_front_handler(std::move(completion), error, size));
+      boost::asio::post(client.get_executor(), boost::beast::bind_front_handler(std::move(completion), error, size));
     }
 
     void AppendTextFrame(std::string_view text)
@@ -188,7 +190,7 @@ private:
     {
       if (std::exchange(state->flushPosted, true))
         return;
-      boost::asio::post(state->socket.get_executor(),
+      boost::asio::post(state->client.get_executor(),
                         [state]
                         {
                           state->flushPosted = false;
@@ -208,13 +210,14 @@ private:
       state->sending = true;
       state->flushAgain = false;
       state->sent.swap(state->gathered);
-      boost::asio::async_write(state->socket, boost::asio::buffer(state->sent),
+      boost::asio::async_write(state->client, boost::asio::buffer(state->sent),
                                [state](error_code failed, std::size_t) { OnSent(state, failed); });
     }
 
     static void OnSent(const std::shared_ptr<State>& state, error_code failed)
     {
       state->sending = false;
+      state->signOfLife = state->signOfLife || state->sent.size() >= sendAt;
       state->sent.clear();
       if (failed)
       {
@@ -233,33 +236,20 @@ private:
           task();
     }
 
-    Socket socket;
+    ClientStream client;
     std::string gathered;
     std::string sent;
     bool sending = false;
     bool flushAgain = false;  // Flush was called while sending
     bool flushPosted = false; // FlushSoon has been called
     bool inputDrained = false;
+    bool signOfLife = false;
     error_code error;
     std::function<void()> whenRoom;
     std::function<void()> whenRoomForControl; // a write of Beast that waits; it has one at a time
     std::function<void()> whenDrained;        // the end of the stream
     std::chrono::steady_clock::time_point teardownDeadline = std::chrono::steady_clock::time_point::max();
   };
-
-  template <class Done>
-  static void Discard(const std::shared_ptr<State>& state, Done done)
-  {
-    state->sent.resize(discardAtOnce);
-    state->socket.async_read_some(boost::asio::buffer(state->sent),
-                                  [state, done = std::move(done)](error_code failed, std::size_t)
-                                  {
-                                    if (failed)
-                                      done();
-                                    else
-                                      Discard(state, done);
-                                  });
-  }
 
   std::shared_ptr<State> m_state;
 };
@@ -271,9 +261,10 @@ void async_teardown(boost::beast::role_type /*role*/, CoalescingStream& stream, 
   stream.Teardown(std::forward<Handler>(handler));
 }
 
-inline void teardown(boost::beast::role_type role, CoalescingStream& stream, boost::system::error_code& error)
+/// Required of a stream; nothing here waits for the end of one.
+inline void teardown(boost::beast::role_type /*role*/, CoalescingStream& stream, boost::system::error_code& /*error*/)
 {
-  boost::beast::websocket::teardown(role, stream.next_layer(), error);
+  stream.next_layer().close();
 }
 
 }

@@ -157,10 +157,18 @@ std::string Dispatcher::Hello(std::uint64_t session) const
   json += ",\"epoch\":";
   AppendString(json, m_epoch);
   const std::pair<std::string_view, std::size_t> limits[] = {
-      {"messageBytes", m_limits.messageBytes},   {"nesting", m_limits.nesting},
-      {"batchCalls", m_limits.batchCalls},       {"connections", m_limits.connections},
-      {"subscriptions", m_limits.subscriptions}, {"callsInFlight", m_limits.callsInFlight},
-      {"outgoingBytes", m_limits.outgoingBytes}, {"outgoingNotifications", m_limits.outgoingNotifications}};
+      {"messageBytes", m_limits.messageBytes},
+      {"nesting", m_limits.nesting},
+      {"batchCalls", m_limits.batchCalls},
+      {"connections", m_limits.connections},
+      {"webSockets", m_limits.webSockets},
+      {"subscriptions", m_limits.subscriptions},
+      {"callsInFlight", m_limits.callsInFlight},
+      {"callsInFlightOverall", m_limits.callsInFlightOverall},
+      {"outgoingBytes", m_limits.outgoingBytes},
+      {"outgoingBytesOverall", m_limits.outgoingBytesOverall},
+      {"outgoingNotifications", m_limits.outgoingNotifications},
+      {"pingAfterSeconds", static_cast<std::size_t>(m_limits.pingAfter.count())}};
   char separator = '{';
   json += ",\"limits\":";
   for (const auto& [name, limit] : limits)

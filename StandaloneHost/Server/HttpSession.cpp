@@ -9,6 +9,9 @@
 #include <boost/beast/http.hpp>
 #include <boost/beast/websocket/rfc6455.hpp>
 
+#include <openssl/sslerr.h>
+
+#include <array>
 #include <optional>
 #include <utility>
 
@@ -17,33 +20,40 @@ namespace Server
 
 namespace http = boost::beast::http;
 using boost::system::error_code;
-using Socket = boost::asio::basic_stream_socket<boost::asio::ip::tcp, boost::asio::io_context::executor_type>;
 using Clock = std::chrono::steady_clock;
 
 namespace
 {
 
 constexpr std::size_t headerBytes = 16384;
+constexpr auto handshakeTime = std::chrono::seconds(10);
 constexpr auto idleTime = std::chrono::seconds(60);
 constexpr auto transferTime = std::chrono::seconds(30);
 constexpr auto closingTime = std::chrono::seconds(2);
 
-/// What a refused visitor is told.
-std::pair<http::status, std::string_view> Refusal(EAdmission admission)
+struct Refusal
+{
+  ERefusal kind;
+  http::status status;
+  std::string_view text; ///< for the visitor
+};
+
+Refusal RefusalFor(EAdmission admission)
 {
   switch (admission)
   {
   case EAdmission::NoToken:
-    return {http::status::unauthorized, "The token is missing or wrong: send \"Authorization: Bearer TOKEN\".\n"};
+    return {ERefusal::NoToken, http::status::unauthorized,
+            "The token is missing or wrong: send \"Authorization: Bearer TOKEN\".\n"};
   case EAdmission::WrongOrigin:
-    return {http::status::forbidden, "Web pages of this origin may not connect; the host allows them with "
-                                     "--allow-origin.\n"};
+    return {ERefusal::WrongOrigin, http::status::forbidden,
+            "Web pages of this origin may not connect; the host allows them with --allow-origin.\n"};
   case EAdmission::WrongHost:
-    return {http::status::forbidden, "This host is reached by its address or as localhost, not by that name.\n"};
   case EAdmission::Welcome:
     break;
   }
-  return {http::status::ok, ""};
+  return {ERefusal::WrongHost, http::status::forbidden,
+          "This host is reached by its address or as localhost, not by that name.\n"};
 }
 
 std::string_view ToView(boost::beast::string_view text)
@@ -54,23 +64,20 @@ std::string_view ToView(boost::beast::string_view text)
 class HttpSession final : public IConnection, public std::enable_shared_from_this<HttpSession>
 {
 public:
-  HttpSession(Socket socket, std::shared_ptr<Core> core) : m_core(std::move(core)), m_socket(std::move(socket))
+  HttpSession(Socket socket, std::shared_ptr<Core> core)
+      : m_core(std::move(core)), m_stream(std::move(socket), m_core->tls.get())
   {
     m_core->connections.Add(*this);
   }
 
   ~HttpSession() { m_core->connections.Remove(*this); }
 
-  /// Waits for the next request.
-  void Read()
+  void Start()
   {
-    m_busy = false;
-    m_parser.emplace();
-    m_parser->header_limit(headerBytes);
-    m_parser->body_limit(m_core->options.limits.messageBytes);
-    m_deadline = Clock::now() + idleTime;
-    http::async_read_header(m_socket, m_buffer, *m_parser,
-                            [self = shared_from_this()](error_code error, std::size_t) { self->OnHeader(error); });
+    if (!m_stream.Encrypted())
+      return Read();
+    AwaitClient(handshakeTime);
+    m_stream.async_handshake([self = shared_from_this()](error_code error) { self->OnHandshake(error); });
   }
 
   void RespondAndClose(http::status status, std::string_view text)
@@ -79,6 +86,8 @@ public:
     Respond(status, "text/plain; charset=utf-8", std::string(text));
   }
 
+  [[nodiscard]] bool Encrypted() const { return m_stream.Encrypted(); }
+
   void Close() override
   {
     m_keepAlive = false;
@@ -86,54 +95,111 @@ public:
       Abort();
   }
 
-  void Abort() override
+  void Abort() override { m_stream.close(); }
+
+  void Tick(Clock::time_point now) override
   {
-    error_code ignored;
-    m_socket.close(ignored);
+    if (now <= m_deadline)
+      return;
+    if (m_busy)
+      m_core->refusals.Note(ERefusal::Overdue, m_stream.Peer(), {});
+    Abort();
   }
 
-  [[nodiscard]] bool Overdue(Clock::time_point now) const override { return now > m_deadline; }
+  [[nodiscard]] std::optional<Clock::time_point> WaitsSince() const override { return m_waitsSince; }
 
   [[nodiscard]] std::weak_ptr<IConnection> Weak() override { return weak_from_this(); }
 
 private:
+  /// The client has so long to do its part, and may be ended meanwhile to make room for another.
+  void AwaitClient(Clock::duration time)
+  {
+    m_waitsSince = Clock::now();
+    m_deadline = *m_waitsSince + time;
+  }
+
+  void OnHandshake(error_code error)
+  {
+    if (!error)
+      return Read();
+    if (error.category() == boost::asio::error::get_ssl_category())
+      m_core->refusals.Note(ERefusal::BadHandshake, m_stream.Peer(), error.message());
+    if (error.category() != boost::asio::error::get_ssl_category() ||
+        ERR_GET_REASON(static_cast<unsigned long>(error.value())) != SSL_R_HTTP_REQUEST)
+      return Abort();
+    static constexpr std::string_view text = "HTTP/1.1 400 Bad Request\r\nConnection: close\r\n"
+                                             "Content-Type: text/plain\r\n\r\nThis port speaks https.\n";
+    boost::asio::async_write(m_stream.Plain(), boost::asio::buffer(text),
+                             [self = shared_from_this()](error_code, std::size_t) { self->Abort(); });
+  }
+
+  /// Waits for the next request.
+  void Read()
+  {
+    m_busy = false;
+    m_parser.emplace();
+    m_parser->header_limit(headerBytes);
+    m_parser->body_limit(m_core->options.limits.messageBytes);
+    AwaitClient(idleTime);
+    http::async_read_header(m_stream, m_buffer, *m_parser,
+                            [self = shared_from_this()](error_code error, std::size_t) { self->OnHeader(error); });
+  }
+
   void OnHeader(error_code error)
   {
     m_busy = true;
-    m_deadline = Clock::now() + transferTime;
     if (error)
       return OnBadRequest(error);
+    AwaitClient(transferTime);
 
     const auto& request = m_parser->get();
     m_keepAlive = request.keep_alive() && !m_core->closing;
     m_origin = request[http::field::origin];
-    const EAdmission admission =
-        Admit({ToView(request[http::field::host]), m_origin, ToView(request[http::field::authorization]),
-               request.method() == http::verb::options},
-              m_core->options);
-    if (admission != EAdmission::Welcome)
-    {
-      m_origin.clear();
-      const auto [status, text] = Refusal(admission);
-      NMX::Log(NMX::serverLog, NMX::ESeverity::Info, "A request was refused: %1%",
-               text.substr(0, text.empty() ? 0 : text.size() - 1));
-      return RespondAndClose(status, text);
-    }
+    if (const EAdmission admission = Admission(); admission != EAdmission::Welcome)
+      return Refuse(admission);
     if (boost::beast::websocket::is_upgrade(request))
     {
       if (request.target() != "/rpc")
         return RespondAndClose(http::status::not_found, "WebSockets are served at /rpc.\n");
-      return StartWebSocket(std::move(m_socket), http::request<http::string_body>(request.base()), m_core);
+      if (m_core->webSockets >= m_core->options.limits.webSockets)
+      {
+        m_core->refusals.Note(ERefusal::TooManyConnections, m_stream.Peer(), "WebSockets");
+        return RespondAndClose(http::status::service_unavailable, "Too many WebSockets.\n");
+      }
+      return StartWebSocket(std::move(m_stream), http::request<http::string_body>(request.base()), m_core);
     }
     if (request[http::field::expect] == "100-continue")
       return SendContinue();
     ReadBody();
   }
 
+  [[nodiscard]] EAdmission Admission() const
+  {
+    const auto& request = m_parser->get();
+    const Document* document = m_core->documents.Find(ToView(request.target()));
+    const bool open = request.method() == http::verb::options ||
+                      (request.method() == http::verb::get && document != nullptr && document->open);
+    return Admit({ToView(request[http::field::host]), m_origin, ToView(request[http::field::authorization]),
+                  ToView(request[http::field::sec_websocket_protocol]), open},
+                 m_core->options);
+  }
+
+  void Refuse(EAdmission admission)
+  {
+    const Refusal refusal = RefusalFor(admission);
+    const auto& request = m_parser->get();
+    const auto detail = refusal.kind == ERefusal::WrongOrigin ? ToView(m_origin)
+                        : refusal.kind == ERefusal::WrongHost ? ToView(request[http::field::host])
+                                                              : std::string_view{};
+    m_core->refusals.Note(refusal.kind, m_stream.Peer(), detail);
+    m_origin.clear();
+    RespondAndClose(refusal.status, refusal.text);
+  }
+
   void SendContinue()
   {
     static constexpr std::string_view text = "HTTP/1.1 100 Continue\r\n\r\n";
-    boost::asio::async_write(m_socket, boost::asio::buffer(text),
+    boost::asio::async_write(m_stream, boost::asio::buffer(text),
                              [self = shared_from_this()](error_code error, std::size_t)
                              {
                                if (!error)
@@ -143,7 +209,7 @@ private:
 
   void ReadBody()
   {
-    http::async_read(m_socket, m_buffer, *m_parser,
+    http::async_read(m_stream, m_buffer, *m_parser,
                      [self = shared_from_this()](error_code error, std::size_t)
                      {
                        if (error)
@@ -155,21 +221,27 @@ private:
 
   void OnBadRequest(error_code error)
   {
+    const auto refuse = [&](http::status status, const std::string& text)
+    {
+      m_core->refusals.Note(ERefusal::BadRequest, m_stream.Peer(), std::string_view(text).substr(0, text.size() - 1));
+      RespondAndClose(status, text);
+    };
     if (error == http::error::body_limit)
-      RespondAndClose(http::status::payload_too_large, "The message is longer than " +
-                                                           std::to_string(m_core->options.limits.messageBytes) +
-                                                           " bytes.\n");
+      refuse(http::status::payload_too_large,
+             "The message is longer than " + std::to_string(m_core->options.limits.messageBytes) + " bytes.\n");
     else if (error == http::error::header_limit)
-      RespondAndClose(http::status::request_header_fields_too_large, "The header is too long.\n");
+      refuse(http::status::request_header_fields_too_large, "The header is too long.\n");
     else if (error == http::error::end_of_stream || error == http::error::partial_message ||
              error.category() != make_error_code(http::error::end_of_stream).category())
       Abort(); // the client has gone
     else
-      RespondAndClose(http::status::bad_request, "Not an HTTP request: " + error.message() + ".\n");
+      refuse(http::status::bad_request, "Not an HTTP request: " + error.message() + ".\n");
   }
 
   void OnRequest()
   {
+    m_waitsSince.reset();
+    m_deadline = Clock::time_point::max();
     const auto& request = m_parser->get();
     const std::string_view target = ToView(request.target());
     const http::verb method = request.method();
@@ -244,8 +316,8 @@ private:
     m_response.body() = std::move(body);
     if (status != http::status::no_content)
       m_response.prepare_payload();
-    m_deadline = Clock::now() + transferTime;
-    http::async_write(m_socket, m_response,
+    AwaitClient(transferTime);
+    http::async_write(m_stream, m_response,
                       [self = shared_from_this()](error_code error, std::size_t) { self->OnSent(error); });
   }
 
@@ -256,33 +328,19 @@ private:
     if (m_response.keep_alive())
       return Read();
     // The rest of what the client sends is read and dropped for a while: to close on it would take back the answer.
-    error_code ignored;
-    m_socket.shutdown(Socket::shutdown_send, ignored);
     m_busy = false;
-    m_deadline = Clock::now() + closingTime;
-    Drain();
-  }
-
-  void Drain()
-  {
-    m_buffer.clear();
-    m_socket.async_read_some(m_buffer.prepare(65536),
-                             [self = shared_from_this()](error_code error, std::size_t)
-                             {
-                               if (error || self->m_core->closing)
-                                 self->Abort();
-                               else
-                                 self->Drain();
-                             });
+    AwaitClient(closingTime);
+    m_stream.async_end([self = shared_from_this()] { self->Abort(); });
   }
 
   const std::shared_ptr<Core> m_core;
-  Socket m_socket;
+  ClientStream m_stream;
   boost::beast::flat_buffer m_buffer;
   std::optional<http::request_parser<http::string_body>> m_parser;
   http::response<http::string_body> m_response;
   std::string m_origin;
   Clock::time_point m_deadline = Clock::time_point::max();
+  std::optional<Clock::time_point> m_waitsSince;
   bool m_busy = false;
   bool m_keepAlive = true;
 };
@@ -291,13 +349,14 @@ private:
 
 void StartHttp(Socket socket, std::shared_ptr<Core> core)
 {
-  std::make_shared<HttpSession>(std::move(socket), std::move(core))->Read();
+  std::make_shared<HttpSession>(std::move(socket), std::move(core))->Start();
 }
 
 void RefuseHttp(Socket socket, std::shared_ptr<Core> core)
 {
-  std::make_shared<HttpSession>(std::move(socket), std::move(core))
-      ->RespondAndClose(http::status::service_unavailable, "Too many connections.\n");
+  const auto session = std::make_shared<HttpSession>(std::move(socket), std::move(core));
+  if (!session->Encrypted())
+    session->RespondAndClose(http::status::service_unavailable, "Too many connections.\n");
 }
 
 }

@@ -1,9 +1,7 @@
 #pragma once
 
+#include "StandaloneHost/Server/ClientStream.h"
 #include "StandaloneHost/Server/Core.h"
-
-#include <boost/asio/io_context.hpp>
-#include <boost/asio/ip/tcp.hpp>
 
 #include <memory>
 
@@ -11,11 +9,9 @@ namespace Server
 {
 
 /// Serves the HTTP requests of a new connection, one after the other, until it ends or becomes a WebSocket. [server]
-void StartHttp(boost::asio::basic_stream_socket<boost::asio::ip::tcp, boost::asio::io_context::executor_type> socket,
-               std::shared_ptr<Core> core);
+void StartHttp(Socket socket, std::shared_ptr<Core> core);
 
-/// Tells a new connection that there are too many, and ends it. [server]
-void RefuseHttp(boost::asio::basic_stream_socket<boost::asio::ip::tcp, boost::asio::io_context::executor_type> socket,
-                std::shared_ptr<Core> core);
+/// Ends a new connection because there are too many, and says so if that takes no handshake. [server]
+void RefuseHttp(Socket socket, std::shared_ptr<Core> core);
 
 }

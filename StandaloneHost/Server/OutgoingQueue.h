@@ -25,9 +25,14 @@ enum class EPolicy
 class OutgoingQueue
 {
 public:
-  explicit OutgoingQueue(const Limits& limits) : m_limits(limits) {}
+  /// `overall` counts the bytes that wait for all clients, and outlives the queue.
+  OutgoingQueue(const Limits& limits, std::size_t& overall) : m_limits(limits), m_overall(overall) {}
+  ~OutgoingQueue() { Clear(); }
+  OutgoingQueue(const OutgoingQueue&) = delete;
+  OutgoingQueue& operator=(const OutgoingQueue&) = delete;
 
-  /// False when the client is too slow; the queue is unchanged then. `callback` tells the callbacks apart.
+  /// False when the client is too slow, or when too much waits for all clients and more than its share for this one;
+  /// the queue is unchanged then. `callback` tells the callbacks apart.
   [[nodiscard]] bool Push(SharedMessage message, EPolicy policy, const void* callback = nullptr);
 
   /// The next message to send. The queue is not empty.
@@ -46,7 +51,11 @@ private:
     const void* callback;
   };
 
+  void Count(std::size_t more, std::size_t less);
+  [[nodiscard]] bool TooMuch(std::size_t size) const;
+
   const Limits& m_limits;
+  std::size_t& m_overall;
   std::deque<Waiting> m_waiting;
   std::size_t m_bytes = 0;
   std::size_t m_changes = 0;

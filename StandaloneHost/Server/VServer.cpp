@@ -4,6 +4,7 @@
 #include "HostInterface/NMX/GlobalLog.h"
 #include "StandaloneHost/Server/Core.h"
 #include "StandaloneHost/Server/HttpSession.h"
+#include "StandaloneHost/Server/TlsContext.h"
 
 #include <boost/asio/io_context.hpp>
 #include <boost/asio/ip/tcp.hpp>
@@ -12,6 +13,7 @@
 
 #include <future>
 #include <random>
+#include <sys/resource.h>
 #include <utility>
 
 namespace Server
@@ -19,7 +21,6 @@ namespace Server
 
 namespace asio = boost::asio;
 using Tcp = asio::ip::tcp;
-using Socket = asio::basic_stream_socket<Tcp, asio::io_context::executor_type>;
 using Acceptor = asio::basic_socket_acceptor<Tcp, asio::io_context::executor_type>;
 using Clock = std::chrono::steady_clock;
 using boost::system::error_code;
@@ -33,12 +34,32 @@ constexpr auto tick = std::chrono::milliseconds(500);
 constexpr auto closingTick = std::chrono::milliseconds(10);
 constexpr auto closingTime = std::chrono::milliseconds(1500);
 constexpr auto acceptPause = std::chrono::milliseconds(100);
+constexpr auto keptTime = std::chrono::seconds(1); // a connection is not ended for another before it is that idle
+constexpr rlim_t otherFiles = 256;                 // what the host needs besides connections
 
 constexpr std::string_view page =
     "<!DOCTYPE html><html lang=\"en\"><meta charset=\"utf-8\"><title>Subject store</title>"
     "<h1>Subject store</h1><p>This is the remote-control server of a subject store. It speaks JSON-RPC 2.0: "
     "<code>POST /rpc</code>, or a WebSocket at <code>/rpc</code>. "
     "<a href=\"/openrpc.json\">openrpc.json</a> describes every function and callback.</p></html>\n";
+
+/// Lets the process have as many open files as it has connections, if the system allows it.
+void AllowOpenFiles(std::size_t connections)
+{
+  rlimit limit{};
+  if (getrlimit(RLIMIT_NOFILE, &limit) != 0 || limit.rlim_cur >= connections + otherFiles)
+    return;
+  limit.rlim_cur = std::min<rlim_t>(limit.rlim_max, connections + otherFiles);
+  if (setrlimit(RLIMIT_NOFILE, &limit) != 0 || limit.rlim_cur < connections + otherFiles)
+    NMX::Log(NMX::serverLog, NMX::ESeverity::Notice,
+             "The system allows %1% open files: less than %2% clients can connect at once.", limit.rlim_cur,
+             connections);
+}
+
+std::unique_ptr<asio::ssl::context> TlsFor(const ServerOptions& options)
+{
+  return options.Encrypted() ? MakeTlsContext(options.tlsCertificate, options.tlsKey) : nullptr;
+}
 
 /// A text that no other start of a host has.
 std::string NewEpoch()
@@ -57,8 +78,8 @@ std::string NewEpoch()
 /// What runs on the server's thread. Handlers hold it weakly: whatever owns the context must not be held by it.
 struct VServer::State : std::enable_shared_from_this<State>
 {
-  State(std::shared_ptr<NMX::IAsioPostalService> service, ServerOptions options)
-      : postal(std::move(service)), core(std::make_shared<Core>(std::move(options), NewEpoch())),
+  State(std::shared_ptr<NMX::IAsioPostalService> service, const ServerOptions& options)
+      : postal(std::move(service)), core(std::make_shared<Core>(options, NewEpoch())),
         acceptor(postal->Context().get_executor()), timer(postal->Context())
   {
   }
@@ -85,7 +106,7 @@ struct VServer::State : std::enable_shared_from_this<State>
     if (error)
     {
       // Most likely there are too many open files: try again when some may have been closed.
-      NMX::Log(NMX::serverLog, NMX::ESeverity::Warning, "A connection could not be accepted: %1%", error.message());
+      core->refusals.Note(ERefusal::NotAccepted, {}, error.message());
       acceptTimer.expires_after(acceptPause);
       acceptTimer.async_wait(
           [weak = weak_from_this()](error_code cancelled)
@@ -97,11 +118,26 @@ struct VServer::State : std::enable_shared_from_this<State>
     }
     error_code ignored;
     socket.set_option(Tcp::no_delay(true), ignored);
-    if (core->connections.Count() >= core->options.limits.connections)
-      RefuseHttp(std::move(socket), core);
-    else
+    if (core->connections.Count() < core->options.limits.connections || MakeRoom())
       StartHttp(std::move(socket), core);
+    else
+    {
+      core->refusals.Note(ERefusal::TooManyConnections, {}, {});
+      RefuseHttp(std::move(socket), core);
+    }
     Accept();
+  }
+
+  /// Ends the connection that has been waiting for its client the longest: so those who open many and do nothing with
+  /// them, or send and read a little at a time, keep nobody out.
+  bool MakeRoom() const
+  {
+    IConnection* longest = core->connections.LongestWaiting(Clock::now() - keptTime);
+    if (longest == nullptr)
+      return false;
+    core->refusals.Note(ERefusal::Displaced, {}, {});
+    longest->Abort();
+    return true;
   }
 
   /// Ends the connections that wait for too long: one coarse timer for all.
@@ -114,12 +150,9 @@ struct VServer::State : std::enable_shared_from_this<State>
           const auto self = weak.lock();
           if (!self || cancelled || self->core->closing)
             return;
-          self->core->connections.ForEach(
-              [now = Clock::now()](IConnection& connection)
-              {
-                if (connection.Overdue(now))
-                  connection.Abort();
-              });
+          const auto now = Clock::now();
+          self->core->connections.ForEach([now](IConnection& connection) { connection.Tick(now); });
+          self->core->refusals.Tick(now);
           self->Tick();
         });
   }
@@ -168,8 +201,8 @@ struct VServer::State : std::enable_shared_from_this<State>
   bool open = false; // on the host's thread
 };
 
-VServer::VServer(std::shared_ptr<NMX::IAsioPostalService> postal, ServerOptions options)
-    : m_state(std::make_shared<State>(std::move(postal), std::move(options)))
+VServer::VServer(std::shared_ptr<NMX::IAsioPostalService> postal, const ServerOptions& options)
+    : m_state(std::make_shared<State>(std::move(postal), options))
 {
 }
 
@@ -198,6 +231,7 @@ void VServer::Open()
 {
   const ServerOptions& options = m_state->core->options;
   const std::string where = options.address + ':' + std::to_string(options.port);
+  m_state->core->tls = TlsFor(options);
   try
   {
     const Tcp::endpoint endpoint(asio::ip::make_address(options.address), options.port);
@@ -213,6 +247,7 @@ void VServer::Open()
   }
   const bool isV6 = options.address.find(':') != std::string::npos;
   m_state->address = (isV6 ? '[' + options.address + ']' : options.address) + ':' + std::to_string(m_state->port);
+  AllowOpenFiles(options.limits.connections);
   m_state->AddDocuments();
   m_state->open = true;
   asio::post(m_state->postal->Context(),
@@ -240,6 +275,16 @@ void VServer::Close()
 const std::string& VServer::Address() const
 {
   return m_state->address;
+}
+
+std::string VServer::Url() const
+{
+  return (m_state->core->tls ? "https://" : "http://") + m_state->address;
+}
+
+std::string VServer::WebSocketUrl() const
+{
+  return (m_state->core->tls ? "wss://" : "ws://") + m_state->address + "/rpc";
 }
 
 unsigned short VServer::Port() const

@@ -7,6 +7,7 @@
 
 #include <cstddef>
 #include <cstdint>
+#include <filesystem>
 #include <memory>
 #include <stdexcept>
 #include <string>
@@ -29,7 +30,11 @@ struct ServerOptions
   TerminalServer2::Level grantedLevel = 2;
   std::string token;                       ///< clients must present it, unless empty
   std::vector<std::string> allowedOrigins; ///< of web pages, beside the server's own
+  std::filesystem::path tlsCertificate{};  ///< PEM file; with it and the key, https and wss are served
+  std::filesystem::path tlsKey{};          ///< PEM file
   Limits limits;
+
+  [[nodiscard]] bool Encrypted() const { return !tlsCertificate.empty(); }
 };
 
 /// What a server has to do.
@@ -44,7 +49,7 @@ struct ServerTraffic
 class VServer : public TerminalServer2::IServer, public NMX::VShared
 {
 public:
-  VServer(std::shared_ptr<NMX::IAsioPostalService> postal, ServerOptions options);
+  VServer(std::shared_ptr<NMX::IAsioPostalService> postal, const ServerOptions& options);
 
   /// The server has been closed.
   ~VServer() override;
@@ -54,15 +59,18 @@ public:
   NMX::IResult RegisterCallback(TerminalServer2::Level level, std::shared_ptr<NMX::IServerCallback> callback) override;
   NMX::IResult RegisterFunction(TerminalServer2::Level level, std::shared_ptr<NMX::IServerFunction> function) override;
 
-  /// Starts to serve. Throws ServerError when the address cannot be used. [host]
+  /// Starts to serve. Throws ServerError when the address, the certificate or its key cannot be used. [host]
   void Open();
 
   /// Stops to accept, finishes outstanding calls with `ShuttingDown`, sends what waits and closes the connections, all
   /// within two seconds; then forgets everything that was registered. [host]
   void Close();
 
-  /// Where it is reached, such as "127.0.0.1:8420". Valid once it is open.
+  /// Where it is reached, such as "127.0.0.1:8420", "http://127.0.0.1:8420" and "ws://127.0.0.1:8420/rpc". Valid once
+  /// it is open.
   [[nodiscard]] const std::string& Address() const;
+  [[nodiscard]] std::string Url() const;
+  [[nodiscard]] std::string WebSocketUrl() const;
   [[nodiscard]] unsigned short Port() const;
 
   /// [any]

@@ -1,12 +1,14 @@
 #include "StandaloneHost/Server/WebSocketSession.h"
 
 #include "HostInterface/NMX/GlobalLog.h"
+#include "StandaloneHost/Server/Admission.h"
 #include "StandaloneHost/Server/CoalescingStream.h"
 
 #include <boost/beast/core/flat_buffer.hpp>
 #include <boost/beast/http/field.hpp>
 #include <boost/beast/websocket.hpp>
 
+#include <algorithm>
 #include <utility>
 
 namespace Server
@@ -24,6 +26,25 @@ constexpr auto handshakeTime = std::chrono::seconds(10);
 constexpr auto closingTime = std::chrono::seconds(2);
 constexpr std::size_t keptBuffer = std::size_t{64} << 10; // for the next message; what a long one took is given back
 
+std::string_view View(const boost::beast::flat_buffer& buffer)
+{
+  return {static_cast<const char*>(buffer.cdata().data()), buffer.size()};
+}
+
+/// Beast checks texts as they come, but not the end of one whose last frame is empty.
+bool EndsWithinCharacter(std::string_view text)
+{
+  for (std::size_t back = 1; back <= std::min<std::size_t>(3, text.size()); ++back)
+  {
+    const auto byte = static_cast<unsigned char>(text[text.size() - back]);
+    if (byte >= 0xC0)
+      return back < (byte >= 0xF0 ? 4U : byte >= 0xE0 ? 3U : 2U);
+    if (byte < 0x80)
+      return false;
+  }
+  return false;
+}
+
 /// One WebSocket client: reads its messages, and queues what is for it. Beast reads, and writes what the protocol asks
 /// for by itself (handshake, pong, close); messages go straight into the stream beneath it.
 class WebSocketSession final : public IListener,
@@ -31,22 +52,30 @@ class WebSocketSession final : public IListener,
                                public std::enable_shared_from_this<WebSocketSession>
 {
 public:
-  WebSocketSession(Socket socket, std::shared_ptr<Core> core)
-      : m_core(std::move(core)), m_stream(CoalescingStream(std::move(socket))), m_queue(m_core->options.limits)
+  WebSocketSession(ClientStream client, std::shared_ptr<Core> core)
+      : m_core(std::move(core)), m_stream(CoalescingStream(std::move(client))),
+        m_queue(m_core->options.limits, m_core->outgoingBytes)
   {
     m_core->connections.Add(*this);
+    ++m_core->webSockets;
   }
 
   ~WebSocketSession()
   {
     m_core->notifier.Forget(*this);
     m_core->connections.Remove(*this);
+    --m_core->webSockets;
   }
 
   void Start(const http::request<http::string_body>& request)
   {
     m_deadline = Clock::now() + handshakeTime;
     m_stream.read_message_max(m_core->options.limits.messageBytes);
+    const auto offered = request[http::field::sec_websocket_protocol];
+    if (OffersProtocol({offered.data(), offered.size()}))
+      m_stream.set_option(websocket::stream_base::decorator(
+          [](websocket::response_type& response)
+          { response.set(http::field::sec_websocket_protocol, webSocketProtocol.data()); }));
     m_stream.async_accept(request, [self = shared_from_this()](error_code error) { self->OnAccepted(error); });
     m_stream.next_layer().FlushSoon();
   }
@@ -63,13 +92,37 @@ public:
     m_closing = true;
     m_closeBegun = true;
     m_core->notifier.Forget(*this);
-    error_code ignored;
-    m_stream.next_layer().next_layer().close(ignored);
+    Client().close();
   }
 
-  [[nodiscard]] bool Overdue(Clock::time_point now) const override
+  void Tick(Clock::time_point now) override
   {
-    return now > m_deadline || now > m_stream.next_layer().TeardownDeadline();
+    if (now > m_deadline || now > m_stream.next_layer().TeardownDeadline())
+      return Abort();
+    if (!m_open || m_closing)
+      return;
+    // While calls are carried out, nothing may be read.
+    if (m_stream.next_layer().TakeSignOfLife() || m_callsInFlight > 0)
+    {
+      m_lastSign = now;
+      m_pinged = false;
+      return;
+    }
+    const auto silence = now - m_lastSign;
+    const auto pingAfter = m_core->options.limits.pingAfter;
+    if (silence > 2 * pingAfter)
+    {
+      m_core->refusals.Note(ERefusal::Silent, Client().Peer(), {});
+      Abort();
+    }
+    else if (silence > pingAfter && !std::exchange(m_pinged, true))
+      m_stream.next_layer().GatherPing();
+  }
+
+  void ReadOn() override
+  {
+    m_waitsForOthers = false;
+    Read();
   }
 
   [[nodiscard]] std::weak_ptr<IConnection> Weak() override { return weak_from_this(); }
@@ -78,9 +131,16 @@ private:
   void OnAccepted(error_code error)
   {
     if (error)
-      return Abort();
+    {
+      // Beast has worded why; the client is told before the connection ends.
+      m_core->refusals.Note(ERefusal::BadHandshake, Client().Peer(), error.message());
+      m_closing = true;
+      m_deadline = Clock::now() + closingTime;
+      return m_stream.next_layer().Teardown([self = shared_from_this()](error_code) { self->Abort(); });
+    }
     m_open = true;
     m_deadline = Clock::time_point::max();
+    m_lastSign = Clock::now();
     Send(std::make_shared<const std::string>(m_core->dispatcher.Hello(++m_core->lastSession)), EPolicy::Reply, nullptr);
     if (m_core->closing)
       return Close();
@@ -89,9 +149,12 @@ private:
 
   void Read()
   {
-    if (m_reading || m_closing)
+    if (m_reading || m_closing || m_waitsForOthers)
       return;
     if (m_callsInFlight >= static_cast<std::ptrdiff_t>(m_core->options.limits.callsInFlight))
+      return;
+    m_waitsForOthers = !m_core->calls.MayBegin(weak_from_this());
+    if (m_waitsForOthers)
       return;
     m_reading = true;
     m_stream.async_read(m_buffer, [self = shared_from_this()](error_code error, std::size_t) { self->OnRead(error); });
@@ -104,13 +167,18 @@ private:
     {
       m_reading = false;
       // The client has gone, or Beast has already told it what it did wrong.
+      if (!m_closing && error.category() == make_error_code(websocket::error::closed).category() &&
+          error != websocket::error::closed)
+        m_core->refusals.Note(ERefusal::BrokenProtocol, Client().Peer(), error.message());
       m_closing = true;
       m_core->notifier.Forget(*this);
       m_deadline = Clock::now() + closingTime;
       m_stream.next_layer().Flush();
       return;
     }
-    if (!m_closing && m_stream.got_text())
+    if (!m_closing && m_stream.got_text() && EndsWithinCharacter(View(m_buffer)))
+      Close(websocket::close_code::bad_payload, "the text ends within a character");
+    else if (!m_closing && m_stream.got_text())
       Handle();
     else if (!m_closing)
       Close(websocket::close_code::unknown_data, "text frames only");
@@ -126,13 +194,12 @@ private:
 
   void Handle()
   {
-    const auto data = m_buffer.cdata();
-    const std::string_view text(static_cast<const char*>(data.data()), data.size());
+    const std::string_view text = View(m_buffer);
     try
     {
-      m_callsInFlight += static_cast<std::ptrdiff_t>(
+      Count(static_cast<std::ptrdiff_t>(
           m_core->dispatcher.Handle(text, this, [self = shared_from_this()](std::string answer, std::size_t calls)
-                                    { self->OnAnswer(std::move(answer), calls); }));
+                                    { self->OnAnswer(std::move(answer), calls); })));
     }
     catch (const std::exception& failure)
     {
@@ -141,9 +208,15 @@ private:
     }
   }
 
+  void Count(std::ptrdiff_t calls)
+  {
+    m_callsInFlight += calls;
+    m_core->calls.Count(calls);
+  }
+
   void OnAnswer(std::string answer, std::size_t calls)
   {
-    m_callsInFlight -= static_cast<std::ptrdiff_t>(calls);
+    Count(-static_cast<std::ptrdiff_t>(calls));
     if (!answer.empty())
       Send(std::make_shared<const std::string>(std::move(answer)), EPolicy::Reply, nullptr);
     if (m_open)
@@ -159,7 +232,7 @@ private:
       Pump();
     else if (!m_closing)
     {
-      NMX::Log(NMX::serverLog, NMX::ESeverity::Notice, "A client that reads too slowly is closed.");
+      m_core->refusals.Note(ERefusal::SlowReader, Client().Peer(), {});
       Close(websocket::close_code::try_again_later, "reads too slowly");
     }
   }
@@ -205,13 +278,18 @@ private:
     m_stream.next_layer().FlushSoon();
   }
 
+  ClientStream& Client() { return m_stream.next_layer().next_layer(); }
+
   const std::shared_ptr<Core> m_core;
   websocket::stream<CoalescingStream> m_stream;
   boost::beast::flat_buffer m_buffer;
   OutgoingQueue m_queue;
   websocket::close_reason m_reason;
   Clock::time_point m_deadline = Clock::time_point::max();
+  Clock::time_point m_lastSign; // when the client was last known to be there
   std::ptrdiff_t m_callsInFlight = 0;
+  bool m_pinged = false;
+  bool m_waitsForOthers = false;
   bool m_open = false;
   bool m_reading = false;
   bool m_closing = false;
@@ -220,9 +298,9 @@ private:
 
 }
 
-void StartWebSocket(Socket socket, http::request<http::string_body> request, std::shared_ptr<Core> core)
+void StartWebSocket(ClientStream stream, http::request<http::string_body> request, std::shared_ptr<Core> core)
 {
-  std::make_shared<WebSocketSession>(std::move(socket), std::move(core))->Start(request);
+  std::make_shared<WebSocketSession>(std::move(stream), std::move(core))->Start(request);
 }
 
 }

@@ -16,5 +16,6 @@ export function crateColor(id = 7) {
 }
 
 // The limits that the server promises in its greeting.
-export const limits = { messageBytes: 1048576, nesting: 32, batchCalls: 256, connections: 1100, subscriptions: 64,
-                        callsInFlight: 1024, outgoingBytes: 8388608, outgoingNotifications: 256 };
+export const limits = { messageBytes: 1048576, nesting: 32, batchCalls: 256, connections: 1100, webSockets: 1024,
+                        subscriptions: 64, callsInFlight: 1024, callsInFlightOverall: 65536, outgoingBytes: 8388608,
+                        outgoingBytesOverall: 268435456, outgoingNotifications: 256, pingAfterSeconds: 30 };

@@ -56,6 +56,8 @@ const refusedOptions = {
   'a missing configuration': [[...listen, '--config', nowhere], escaped(nowhere)],
   'a missing token file': [[...listen, '--token-file', nowhere], escaped(nowhere)],
   'an empty token file': [[...listen, '--token-file', temporaryFile('empty-token', '\n')], /token/],
+  'a token that fits no header': [[...listen, '--token-file', temporaryFile('odd-token', 'spät\n')], /ASCII/],
+  'a token without an end': [[...listen, '--token-file', temporaryFile('long-token', 'x'.repeat(1e6))], /512/],
   'an origin that is none': [[...listen, '--allow-origin', 'not an origin'], /allow-origin|not an origin/],
   'a ready file that cannot be written': [[...listen, '--ready-file', nowhere], escaped(nowhere)],
 };

@@ -48,9 +48,9 @@ export class Connection {
   #others = [];
   #lastId = 0;
 
-  static async open(host, options = {}) {
+  static async open(host, { protocols = [], ...options } = {}) {
     const connection = new Connection();
-    connection.socket = new WebSocket(host.ws, options);
+    connection.socket = new WebSocket(host.ws, protocols, options);
     connection.closed = new Promise(done => {
       connection.socket.on('close', (code, reason) => {
         done(code);

@@ -26,7 +26,8 @@ std::vector<std::string> Drain(Server::OutgoingQueue& queue)
 TEST(OutgoingQueue, MergesChangesOfOneCallbackAndNothingElse)
 {
   const Server::Limits limits;
-  Server::OutgoingQueue queue(limits);
+  std::size_t overall = 0;
+  Server::OutgoingQueue queue(limits, overall);
   const int first = 0, second = 0;
   EXPECT_TRUE(queue.Push(Message("change 1"), EPolicy::Change, &first));
   EXPECT_TRUE(queue.Push(Message("reply"), EPolicy::Reply));
@@ -46,7 +47,8 @@ TEST(OutgoingQueue, TellsWhenTheClientIsTooSlow)
   Server::Limits limits;
   limits.outgoingBytes = 10;
   limits.outgoingNotifications = 2;
-  Server::OutgoingQueue queue(limits);
+  std::size_t overall = 0;
+  Server::OutgoingQueue queue(limits, overall);
   EXPECT_TRUE(queue.Push(Message("1234567"), EPolicy::Reply));
   EXPECT_FALSE(queue.Push(Message("1234"), EPolicy::Reply));
   EXPECT_TRUE(queue.Push(Message("s"), EPolicy::Sequence));
@@ -55,4 +57,33 @@ TEST(OutgoingQueue, TellsWhenTheClientIsTooSlow)
   EXPECT_TRUE(queue.Push(Message("r"), EPolicy::Reply));
   EXPECT_THAT(Drain(queue), ElementsAre("1234567", "s", "s", "r"));
   EXPECT_TRUE(queue.Push(Message("s"), EPolicy::Sequence));
+}
+
+TEST(OutgoingQueue, LeavesEachClientItsShareWhenTooMuchWaitsForAll)
+{
+  Server::Limits limits;
+  limits.outgoingBytes = 80;
+  limits.outgoingBytesOverall = 100;
+  limits.connections = 10;
+  std::size_t overall = 0;
+  Server::OutgoingQueue good(limits, overall);
+  {
+    Server::OutgoingQueue greedy(limits, overall);
+    EXPECT_TRUE(greedy.Push(Message(std::string(80, 'x')), EPolicy::Reply));
+    EXPECT_TRUE(good.Push(Message(std::string(20, 'x')), EPolicy::Reply));
+    EXPECT_FALSE(good.Push(Message("x"), EPolicy::Reply)) << "more than its share, and all is taken";
+    EXPECT_EQ(Drain(good).size(), 1U);
+    EXPECT_EQ(overall, 80U);
+    const int callback = 0;
+    EXPECT_TRUE(greedy.Push(Message(""), EPolicy::Change, &callback));
+    EXPECT_TRUE(good.Push(Message(std::string(20, 'x')), EPolicy::Change, &callback));
+    EXPECT_FALSE(greedy.Push(Message("x"), EPolicy::Reply));
+    EXPECT_EQ(Drain(good).size(), 1U);
+    EXPECT_TRUE(good.Push(Message(std::string(10, 'x')), EPolicy::Reply));
+    EXPECT_TRUE(good.Push(Message(std::string(10, 'x')), EPolicy::Reply));
+    EXPECT_EQ(overall, 100U);
+    EXPECT_EQ(Drain(good).size(), 2U);
+  }
+  EXPECT_EQ(overall, 0U) << "what waited for a client that has gone is not counted any more";
+  EXPECT_TRUE(good.Push(Message(std::string(80, 'x')), EPolicy::Reply));
 }

@@ -1,0 +1,169 @@
+// What the server does not let strangers do: to listen in, to get in without the token, to keep others out.
+
+import assert from 'node:assert/strict';
+import { execFileSync } from 'node:child_process';
+import { readFileSync, writeFileSync } from 'node:fs';
+import https from 'node:https';
+import { join } from 'node:path';
+import { describe, test } from 'node:test';
+import { setTimeout as sleep } from 'node:timers/promises';
+import tls from 'node:tls';
+
+import { askColor, crateColor, limits, subjects } from './crate.mjs';
+import { inTime, refusedStart, scaled, temporaryDirectory, temporaryFile, withHost } from './host.mjs';
+import { Connection, handshake, post, RawSocket, rawRequest, request } from './wire.mjs';
+
+const folder = temporaryDirectory();
+const [certificate, key, otherKey, lockedKey] = ['cert', 'key', 'other-key', 'locked-key']
+  .map(name => join(folder, `${name}.pem`));
+const openssl = (...options) => execFileSync('openssl', options, { stdio: 'pipe' });
+openssl('req', '-x509', '-newkey', 'rsa:2048', '-nodes', '-days', '2', '-subj', '/CN=stage', '-addext',
+        'subjectAltName=IP:127.0.0.1', '-keyout', key, '-out', certificate);
+openssl('genrsa', '-out', otherKey, '2048');
+openssl('rsa', '-in', key, '-aes256', '-passout', 'pass:secret', '-out', lockedKey);
+const ca = readFileSync(certificate);
+const encrypted = ['--tls-cert', certificate, '--tls-key', key];
+
+function refusals(host, what) {
+  return host.stderr.split('\n').filter(line => line.includes('Refused') && what.test(line));
+}
+
+// Waits until the host has written so many lines of refusal.
+async function refused(host, what, count = 1) {
+  for (let i = 0; i < 100 && refusals(host, what).length < count; ++i)
+    await sleep(scaled(20));
+  assert.equal(refusals(host, what).length, count, host.stderr);
+}
+
+function askEncrypted(host, options = {}) {
+  return inTime(new Promise((done, failed) => {
+    const outgoing = https.request(`${host.url}/rpc`, { method: 'POST', agent: false, ca, ...options }, incoming => {
+      let text = '';
+      incoming.on('data', part => { text += part; }).on('end', () => done(JSON.parse(text))).on('error', failed);
+    });
+    outgoing.on('error', failed).end(askColor());
+  }), 'an answer over https');
+}
+
+describe('Encrypted', () => {
+  test('calls and WebSockets are served, old protocols and plain requests are not',
+       () => withHost({ subjects, options: encrypted }, async host => {
+    assert.match(`${host.url} ${host.ws}`, /^https:\S+ wss:\S+\/rpc$/);
+    for (const maxVersion of ['TLSv1.2', 'TLSv1.3'])
+      assert.deepEqual(await askEncrypted(host, { maxVersion }), crateColor());
+    await assert.rejects(askEncrypted(host, { minVersion: 'TLSv1', maxVersion: 'TLSv1.1', ciphers: 'ALL:@SECLEVEL=0' }));
+    await assert.rejects(askEncrypted(host, { ca: undefined }), /self-signed/);
+
+    const connection = await Connection.open(host, { ca, origin: host.url });
+    await connection.call('Server.Subscribe', ['BasicObjectServices.*']);
+    const longName = 'x'.repeat(200);
+    for (let i = 0; i < 300; ++i)
+      connection.notify('BasicObjectServices.SetProximityGroupName', ['Crate', `${longName}${i}`]);
+    assert.equal((await connection.call('BasicObjectServices.ProximityGroupName', ['Crate']))
+      .result.outputs.ProximityGroupName, `${longName}299`);
+    assert.equal((await connection.nextNotification()).method, 'BasicObjectServices.BasicObjectChangedCallback');
+    assert.equal(await connection.close(1000), 1000);
+
+    const plain = await request({ url: host.url.replace('https', 'http') }, { body: askColor() });
+    assert.deepEqual([plain.status, plain.body], [400, 'This port speaks https.\n']);
+    await refused(host, /handshake failed/);
+  }));
+
+  test('a connection that stops in the middle harms nobody', () => withHost({ subjects, options: encrypted },
+                                                                        async host => {
+    for (const bytes of [Buffer.of(0x16, 3, 1), Buffer.from('no TLS at all\r\n\r\n'), Buffer.alloc(0)]) {
+      const raw = await RawSocket.open(host);
+      raw.socket.end(bytes);
+      await inTime(raw.ended, 'the connection ends');
+    }
+    const halfway = tls.connect({ port: host.port, host: '127.0.0.1', ca });
+    await inTime(new Promise(done => halfway.on('secureConnect', done)), 'the handshake');
+    halfway.write('POST /rpc HTTP/1.1\r\nHost: 127.0.0.1\r\nContent-Le');
+    halfway.destroy();
+    const idle = tls.connect({ port: host.port, host: '127.0.0.1', ca });
+    await inTime(new Promise(done => idle.on('secureConnect', done)), 'the handshake');
+    assert.deepEqual(await askEncrypted(host), crateColor());
+    idle.on('error', () => {});
+  }));
+
+  test('needs a certificate and its own key', async () => {
+    const nothing = temporaryFile('nothing.pem', '');
+    const refusedOptions = [
+      [['--tls-cert', certificate], /--tls-key/], [['--tls-key', key], /--tls-cert/],
+      [['--tls-cert', '/nonexistent', '--tls-key', key], /certificate "\/nonexistent"/],
+      [['--tls-cert', nothing, '--tls-key', key], /certificate ".*nothing\.pem"/],
+      [['--tls-cert', certificate, '--tls-key', nothing], /private key ".*nothing\.pem"/],
+      [['--tls-cert', certificate, '--tls-key', folder], /private key/],
+      [['--tls-cert', certificate, '--tls-key', otherKey], /private key ".*other-key\.pem"/],
+      [['--tls-cert', certificate, '--tls-key', lockedKey], /private key ".*locked-key\.pem"/],
+      [['--ping-after', '0'], /ping-after/], [['--ping-after', '99999'], /ping-after/],
+    ];
+    for (const [options, says] of refusedOptions) {
+      const { status, lines } = await refusedStart(['--data', ':memory:', '--listen', '127.0.0.1:0', ...options]);
+      assert.equal(status, 2);
+      assert.equal(lines.length, 1);
+      assert.match(lines[0], says);
+    }
+  });
+});
+
+test('A web page shows its token in the list of protocols', () => {
+  const token = '??~~open sesame/42=';
+  const file = temporaryFile('token', `${token}\n`);
+  return withHost({ subjects, options: ['--token-file', file] }, async host => {
+    const encoded = Buffer.from(token).toString('base64url');
+    const connection = await Connection.open(host, { protocols: ['subject-store', `bearer.${encoded}`] });
+    assert.equal(connection.socket.protocol, 'subject-store');
+    assert.equal((await connection.call('BasicObjectServices.BasicObjectList')).result.code, 0);
+    connection.socket.terminate();
+    for (const protocols of [['subject-store'], ['subject-store', 'bearer.wrong'], [`bearer.${encoded}x`]])
+      await assert.rejects(Connection.open(host, { protocols }), /401/);
+    for (const [path, status] of [['/', 200], ['/openrpc.json', 401], ['/nowhere', 401]])
+      assert.equal((await request(host, { method: 'GET', path })).status, status, path);
+    await refused(host, /without the right token/);
+  });
+});
+
+test('Refusals do not fill the log', () => withHost({ subjects }, async host => {
+  for (let i = 0; i < 200; ++i)
+    assert.equal((await request(host, { headers: { Origin: `https://evil${i}.example` }, body: '' })).status, 403);
+  await refused(host, /web page of another origin/);
+  assert.equal(await host.stop(), 0);
+}));
+
+test('Connections that do nothing make room for others', () => withHost({ subjects }, async host => {
+  const open = async count => {
+    const some = [];
+    while (some.length < count)
+      some.push(...await Promise.all(Array.from({ length: Math.min(50, count - some.length) },
+                                                () => RawSocket.open(host))));
+    return some;
+  };
+  const webSockets = await open(limits.webSockets);
+  const upgrade = rawRequest(host, '', { method: 'GET', headers: Object.entries(handshake).map(h => h.join(': ')) });
+  await Promise.all(webSockets.map(raw => raw.exchange(upgrade, /Server\.Hello/)));
+  const idle = await open(limits.connections - limits.webSockets);
+  for (const raw of idle)
+    raw.socket.write('POST /rpc HTTP/1.1\r\n'); // and no more
+  assert.equal((await request(host, { headers: handshake, method: 'GET' })).status, 503);
+  await sleep(1100);
+  for (let i = 0; i < 5; ++i)
+    assert.deepEqual(await post(host, 'BasicObjectServices.Color', ['Crate']), crateColor(1));
+  await inTime(Promise.race(idle.map(raw => raw.ended)), 'an idle connection is ended');
+  assert.match(await webSockets[0].exchange('', /$/), /Server\.Hello/);
+  for (const raw of [...webSockets, ...idle])
+    raw.socket.destroy();
+}));
+
+test('A client that does not answer pings is ended, one that answers stays',
+     () => withHost({ subjects, options: ['--ping-after', '1'] }, async host => {
+  const [silent, lively] = await Promise.all([Connection.open(host, { autoPong: false }), Connection.open(host)]);
+  let pings = 0;
+  lively.socket.on('ping', () => { ++pings; });
+  await inTime(silent.closed, 'the silent client is ended', 6000);
+  await sleep(1500);
+  assert.ok(pings >= 2);
+  assert.equal((await lively.call('BasicObjectServices.BasicObjectList')).result.code, 0);
+  await refused(host, /does not answer pings/);
+  lively.socket.terminate();
+}));
