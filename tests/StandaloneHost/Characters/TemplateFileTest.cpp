@@ -2,6 +2,8 @@
 
 #include "tests/Support/TemplateFixture.h"
 
+#include <sys/syscall.h>
+#include <thread>
 #include <unistd.h>
 
 namespace Characters
@@ -91,10 +93,22 @@ TEST_F(CharacterTemplateFileTest, RefusesMalformedFilesAndTellsWhere)
 
 TEST_F(CharacterTemplateFileTest, TellsAFileThatItMayNotReadFromWrongContent)
 {
-  if (geteuid() == 0)
-    GTEST_SKIP() << "root may read everything";
-  std::filesystem::permissions(Write(File(goodSegments + goodSlots)), std::filesystem::perms::none);
-  EXPECT_EQ(Refusal(ReadTemplate, m_file), "unreadable 1:1: the file cannot be read: Permission denied");
+  const auto file = Write(File(goodSegments + goodSlots));
+  std::filesystem::permissions(file.parent_path(), std::filesystem::perms{0755});
+  // Root may read every file: another user tries. Each thread has a user of its own.
+  std::string refusal;
+  std::thread(
+      [&]
+      {
+        std::filesystem::permissions(file, std::filesystem::perms::none);
+        if (geteuid() == 0)
+        {
+          ASSERT_EQ(syscall(SYS_setresuid, -1, 65534, -1), 0);
+        }
+        refusal = Refusal(ReadTemplate, file);
+      })
+      .join();
+  EXPECT_EQ(refusal, "unreadable 1:1: the file cannot be read: Permission denied");
 }
 
 }
