@@ -16,6 +16,12 @@ VDeviceModel::VDeviceModel(const PanelBackend& backend, StoreWatch& watch)
   m_rows = Read();
 }
 
+bool VDeviceModel::Has(const std::string& urn) const
+{
+  return std::ranges::binary_search(m_rows, urn, {},
+                                    [](const Row& row) -> const std::string& { return row.device.urn; });
+}
+
 int VDeviceModel::rowCount(const QModelIndex& parent) const
 {
   return parent.isValid() ? 0 : static_cast<int>(m_rows.size());

@@ -36,6 +36,9 @@ public:
   /// `watch` outlives this.
   VDeviceModel(const PanelBackend& backend, StoreWatch& watch);
 
+  /// Whether the host had the device when the model last looked.
+  [[nodiscard]] bool Has(const std::string& urn) const;
+
   [[nodiscard]] int rowCount(const QModelIndex& parent = {}) const override;
   [[nodiscard]] QVariant data(const QModelIndex& index, int role) const override;
   [[nodiscard]] QHash<int, QByteArray> roleNames() const override;

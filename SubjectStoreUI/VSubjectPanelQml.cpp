@@ -89,18 +89,20 @@ struct VSubjectPanelQml::Implementation
     selectedSubjects = FromIds(SubjectsOf(items));
   }
 
-  /// The selection keeps subjects that have left the store; no command could do anything with them.
+  /// The selection keeps subjects and devices that have gone; no command could do anything with them.
   void DeselectRemoved() const
   {
     if (!backend.selection)
       return;
     std::vector<SelectionItem> items = backend.selection->Selection();
-    const auto dropGone = [&items](const NMX::IStoreReader& access)
+    const auto dropGone = [this, &items](const NMX::IStoreReader& access)
     {
       return std::erase_if(items,
-                           [&access](const SelectionItem& item)
+                           [this, &access](const SelectionItem& item)
                            {
                              ESubjectKind kind{};
+                             if (!item.device.empty())
+                               return !devices.Has(item.device);
                              return item.subject.Valid() && access.Kind(item.subject, kind).Failed();
                            });
     };

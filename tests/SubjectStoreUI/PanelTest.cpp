@@ -506,12 +506,14 @@ TEST_F(PanelTest, DevicesAreListedWithWhatTheyAreLinkedTo)
   const VResultGadget rebooted = panel.rebootSubjects(List({glove}));
   EXPECT_EQ(rebooted.Name(), "NotConnected") << "the other was tried all the same";
   EXPECT_EQ(rebooted.Reason(), "\"a\" cannot be restarted: The device is not connected.");
+  selection->Select({{{}, -1, "a"}, {{}, -1, "b"}});
   SetApplication("Application/Devices/a/Type", {});
   SetApplication("Application/Devices/a/Connected", {});
   Wait();
   shadow.Check();
   ASSERT_EQ(devices.rowCount(), 1);
   EXPECT_EQ(devices.index(0, 0).data(VDeviceModel::Connected), false);
+  EXPECT_EQ(selection->Selection(), (std::vector<SelectionItem>{{{}, -1, "b"}})) << "what has gone is not selected";
   EXPECT_EQ(work.setClusterPattern(VStoreIdGadget(glove), 0, 5).Name(), "Ok");
   EXPECT_EQ(work.setClusterPattern(VStoreIdGadget(glove), 0, -1).Name(), "InvalidValue");
   EXPECT_EQ(work.setClusterPattern(VStoreIdGadget(glove), 2, 1).Name(), "InvalidIndex");
