@@ -89,13 +89,15 @@ public:
   }
 
   template <class Buffers, class Handler>
-  auto async_read_some(const Buffers& buffers, Handler&& handler)
+  void async_read_some(const Buffers& buffers, Handler&& handler)
   {
     // More is asked for once something has come.
     m_state->signOfLife = true;
     m_state->inputDrained = true;
+    ++m_state->reads;
+    // First, so that what is there already is worked through before anything is sent.
+    m_state->client.async_read_some(buffers, std::forward<Handler>(handler));
     FlushSoon();
-    return m_state->client.async_read_some(buffers, std::forward<Handler>(handler));
   }
 
   template <class Buffers, class Handler>
@@ -128,6 +130,8 @@ public:
 
 private:
   static constexpr std::size_t sendAt = std::size_t{64} << 10;
+  static constexpr std::size_t keptBytes = std::size_t{16} << 10; // what more took is given back
+  static constexpr int mostPostponed = 16;
   static constexpr std::size_t waitAt = std::size_t{256} << 10;
   static constexpr auto teardownTime = std::chrono::seconds(2);
 
@@ -188,11 +192,19 @@ private:
 
     static void FlushSoon(const std::shared_ptr<State>& state)
     {
-      if (std::exchange(state->flushPosted, true))
-        return;
+      if (!std::exchange(state->flushPosted, true))
+        PostFlush(state, mostPostponed);
+    }
+
+    /// While more is read, which happens at once where TLS has more than one record at hand, its answers may go out with
+    /// what has gathered.
+    static void PostFlush(const std::shared_ptr<State>& state, int postpone)
+    {
       boost::asio::post(state->client.get_executor(),
-                        [state]
+                        [state, postpone, reads = state->reads]
                         {
+                          if (postpone > 0 && state->reads != reads)
+                            return PostFlush(state, postpone - 1);
                           state->flushPosted = false;
                           Flush(state);
                         });
@@ -219,6 +231,8 @@ private:
       state->sending = false;
       state->signOfLife = state->signOfLife || state->sent.size() >= sendAt;
       state->sent.clear();
+      if (state->sent.capacity() > keptBytes)
+        std::string().swap(state->sent);
       if (failed)
       {
         state->error = failed;
@@ -244,6 +258,7 @@ private:
     bool flushPosted = false; // FlushSoon has been called
     bool inputDrained = false;
     bool signOfLife = false;
+    std::uint64_t reads = 0; // how often more has been asked for
     error_code error;
     std::function<void()> whenRoom;
     std::function<void()> whenRoomForControl; // a write of Beast that waits; it has one at a time
