@@ -7,7 +7,9 @@
 #include "StandaloneHost/Characters/VCharacterControls.h"
 #include "StandaloneHost/Evaluation/VObjectEvaluationEngine.h"
 #include "StandaloneHost/FileIO/VRunaCoreFileIO.h"
+#include "StandaloneHost/Files/ConfigurationError.h"
 #include "StandaloneHost/Files/SubjectConfiguration.h"
+#include "StandaloneHost/Files/WholeFile.h"
 #include "StandaloneHost/Panel/VObjectPresetProvider.h"
 #include "StandaloneHost/Panel/VOfflineStoreServices.h"
 #include "StandaloneHost/Panel/VPanelServices.h"
@@ -31,8 +33,9 @@
 #include "StandaloneHost/Window/VWindow.h"
 
 #include <cstdio>
-#include <fstream>
 #include <optional>
+#include <stdexcept>
+#include <string>
 #include <system_error>
 #include <unistd.h>
 
@@ -90,17 +93,19 @@ void WriteReadyFile(const std::filesystem::path& file, const Server::VServer& se
 {
   if (file.empty())
     return;
-  std::filesystem::path unfinished = file;
-  unfinished += ".unfinished";
+  std::error_code error;
+  if (file.has_parent_path() && !std::filesystem::is_directory(file.parent_path(), error))
+    throw std::runtime_error("cannot write the ready file \"" + file.string() + "\": its folder is not there");
+  const std::string text = "{\"url\": \"" + server.Url() + "\", \"ws\": \"" + server.WebSocketUrl() +
+                           "\", \"pid\": " + std::to_string(getpid()) + "}\n";
+  try
   {
-    std::ofstream out(unfinished);
-    out << "{\"url\": \"" << server.Url() << "\", \"ws\": \"" << server.WebSocketUrl() << "\", \"pid\": " << getpid()
-        << "}\n";
-    out.flush();
-    if (!out)
-      throw std::runtime_error("cannot write the ready file \"" + file.string() + "\"");
+    Files::WriteWholeFile(file, text, [](const std::filesystem::path&) {});
   }
-  std::filesystem::rename(unfinished, file);
+  catch (const Files::ConfigurationError& failure)
+  {
+    throw std::runtime_error("cannot write the ready file: " + std::string(failure.what()));
+  }
 }
 
 /// Object evaluation, if the feature is switched on.
@@ -230,7 +235,9 @@ void Run(Parts& parts, const Options& options, Window::VLogModel* log)
   parts.calibration->Open(calibrationStrand);
   parts.server->Open();
   if (parts.window)
-    parts.window->Show(*parts.server, [&plugin = *parts.plugin] { return plugin.CanClose(); });
+    parts.window->Show(
+        *parts.server, [&plugin = *parts.plugin] { return plugin.CanClose(); },
+        [store = parts.store] { return store->Fault(); });
   AnnounceAddress(options, *parts.server);
   QCoreApplication::exec();
 }

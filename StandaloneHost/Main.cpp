@@ -10,7 +10,8 @@ namespace
 /// Exit status for whatever keeps the host from starting.
 constexpr int cannotStart = 2;
 
-/// SIGINT and SIGTERM are waited for, not handled: no thread is interrupted by them.
+/// SIGINT and SIGTERM are waited for, not handled: no thread is interrupted by them. A peer that is gone and a file
+/// that may not grow are errors of the calls that meet them.
 void BlockSignals()
 {
   sigset_t signals;
@@ -19,6 +20,7 @@ void BlockSignals()
   sigaddset(&signals, SIGTERM);
   pthread_sigmask(SIG_BLOCK, &signals, nullptr);
   std::signal(SIGPIPE, SIG_IGN);
+  std::signal(SIGXFSZ, SIG_IGN);
 }
 
 }

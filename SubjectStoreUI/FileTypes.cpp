@@ -3,7 +3,12 @@
 #include "HostInterface/NMX/GlobalLog.h"
 #include "StoreInterface/WideText.h"
 
+#include <fcntl.h>
+#include <unistd.h>
+
 #include <algorithm>
+#include <cerrno>
+#include <cstdio>
 #include <map>
 #include <system_error>
 
@@ -57,6 +62,30 @@ std::filesystem::path ToPath(const std::wstring& text)
 
 /// More than anybody would choose from.
 constexpr std::size_t maximumFiles = 1000;
+
+EResult ResultOf(const std::error_code& error)
+{
+  if (error == std::errc::file_exists)
+    return EResult::AlreadyPresent;
+  return error == std::errc::no_space_on_device ? EResult::DiskFull : EResult::FileIOFailure;
+}
+
+/// Copies to a place where nothing is, all of it or nothing.
+std::error_code CopyWhole(const std::filesystem::path& file, const std::filesystem::path& target)
+{
+  const std::filesystem::path unfinished = target.parent_path() / (".unfinished-" + std::to_string(getpid()));
+  std::error_code error, ignored;
+  std::filesystem::copy_file(file, unfinished, std::filesystem::copy_options::overwrite_existing, error);
+  if (!error && renameat2(AT_FDCWD, unfinished.c_str(), AT_FDCWD, target.c_str(), RENAME_NOREPLACE) != 0)
+  {
+    error.assign(errno, std::generic_category());
+    if (errno == EINVAL) // to this file system
+      std::filesystem::rename(unfinished, target, error);
+  }
+  if (error)
+    std::filesystem::remove(unfinished, ignored);
+  return error;
+}
 
 }
 
@@ -112,14 +141,13 @@ IResult CopyToUserFolder(const IFileLocations& locations, const std::filesystem:
     return fail(EResult::FileNotFound, "there is no such file");
   if (!std::filesystem::is_regular_file(status))
     return fail(EResult::InvalidType, "it is not a file");
-  std::filesystem::create_directories(folder, error);
+  std::filesystem::create_directory(folder, error);
   if (error)
-    return fail(EResult::FileIOFailure, error.message());
+    return fail(ResultOf(error), error.message());
   if (std::filesystem::exists(target, error))
     return fail(EResult::AlreadyPresent, "there is a file of that name already");
-  std::filesystem::copy_file(file, target, std::filesystem::copy_options::none, error);
-  if (error)
-    return fail(error == std::errc::file_exists ? EResult::AlreadyPresent : EResult::FileIOFailure, error.message());
+  if (const std::error_code failure = CopyWhole(file, target))
+    return fail(ResultOf(failure), failure.message());
   NMX::Log(NMX::subjectStoreLog, NMX::ESeverity::Notice, "Copied %1% to %2%", file.string(), target.string());
   return EResult::Ok;
 }

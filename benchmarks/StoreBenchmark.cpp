@@ -1,15 +1,17 @@
 // Finding one of 100,000 subjects by name and reading one entry, against a bare hash lookup of the same names; and what
 // an edit costs in stores of different size.
 
-#include "StandaloneHost/Store/IArchive.h"
+#include "StandaloneHost/Store/SqliteArchive.h"
 #include "StandaloneHost/Store/VStore.h"
 #include "StoreInterface/EntryPaths.h"
 #include "StoreInterface/TypedAccess.h"
+#include "tests/Support/TemporaryFolder.h"
 
 #include <benchmark/benchmark.h>
 #include <boost/unordered/unordered_flat_map.hpp>
 
 #include <cstdlib>
+#include <fstream>
 #include <random>
 #include <string>
 #include <vector>
@@ -24,16 +26,21 @@ std::string Name(int i)
   return "Subject " + std::to_string(i);
 }
 
-std::shared_ptr<Store::VStore> MakeStore(int count)
+void Fill(NMX::IStore& store, int count)
 {
-  auto store = NMX::MakeShared<Store::VStore>();
-  const auto editor = store->Editor();
+  const auto editor = store.Editor();
   for (int i = 0; i < count; ++i)
   {
     NMX::TSubjectStoreId id;
     (void)editor->Add(NMX::ESubjectKind::BasicObjects, Name(i), id);
   }
   (void)editor->Commit();
+}
+
+std::shared_ptr<Store::VStore> MakeStore(int count)
+{
+  auto store = NMX::MakeShared<Store::VStore>();
+  Fill(*store, count);
   return store;
 }
 
@@ -89,19 +96,51 @@ void FindByNameAndRead(benchmark::State& state)
   }
 }
 
-void EditOneEntry(benchmark::State& state)
+/// Disables and enables one object.
+void EditInTurn(benchmark::State& state, NMX::IStore& store)
 {
-  const auto store = MakeStore(static_cast<int>(state.range(0)));
   bool enabled = false;
   for (auto _ : state)
   {
-    const auto editor = store->Editor();
+    const auto editor = store.Editor();
     NMX::TSubjectStoreId id;
     (void)editor->FindByName("Subject 50", id);
     (void)editor->SetValue(id, NMX::Paths::Enabled(), enabled);
-    (void)editor->Commit();
+    if (editor->Commit().Failed())
+      state.SkipWithError("the edit was not kept");
     enabled = !enabled;
   }
+}
+
+void EditOneEntry(benchmark::State& state)
+{
+  EditInTurn(state, *MakeStore(static_cast<int>(state.range(0))));
+}
+
+/// The same, with each edit in a database.
+void EditOneEntryKept(benchmark::State& state)
+{
+  const TemporaryFolder folder;
+  const auto store =
+      NMX::MakeShared<Store::VStore>(std::make_unique<Store::SqliteArchive>(folder.Path() / "store.sqlite"));
+  Fill(*store, static_cast<int>(state.range(0)));
+  EditInTurn(state, *store);
+}
+
+/// What it costs to see that the database and its log are still those that were opened.
+void LookAtTwoFiles(benchmark::State& state)
+{
+  const TemporaryFolder folder;
+  Store::WatchedFile files[] = {Store::WatchedFile(folder.Path() / "store.sqlite"),
+                                Store::WatchedFile(folder.Path() / "store.sqlite-wal")};
+  for (auto& file : files)
+  {
+    std::ofstream(file.Path()) << "content";
+    file.Watch();
+  }
+  for (auto _ : state)
+    for (const auto& file : files)
+      benchmark::DoNotOptimize(file.State());
 }
 
 /// Disables and enables an object of a proximity group of ten, whose warnings depend on each other.
@@ -199,7 +238,7 @@ void OpenStore(benchmark::State& state)
   {
     explicit Archive(int subjects) : count(subjects) {}
     Store::ChangeSet Load() override { return ArchiveContent(count); }
-    NMX::IResult Keep(const Store::ChangeSet&) override { std::abort(); }
+    NMX::IResult Keep(const Store::ChangeSet&, const Store::StoreState&) override { std::abort(); }
     int count;
   };
   for (auto _ : state)
@@ -212,6 +251,8 @@ void OpenStore(benchmark::State& state)
 BENCHMARK(BareHashLookup);
 BENCHMARK(FindByNameAndRead);
 BENCHMARK(EditOneEntry)->Arg(100)->Arg(100000);
+BENCHMARK(EditOneEntryKept)->Arg(100);
+BENCHMARK(LookAtTwoFiles);
 BENCHMARK(EditInAGroup)->Arg(100)->Arg(100000);
 BENCHMARK(EditInASlot)->Arg(100)->Arg(100000);
 BENCHMARK(TakeOver)->Arg(10000)->Unit(benchmark::kMillisecond);

@@ -4,6 +4,7 @@
 #include "StandaloneHost/Store/StoreState.h"
 
 #include <stdexcept>
+#include <string>
 
 namespace Store
 {
@@ -25,8 +26,15 @@ public:
   [[nodiscard]] virtual ChangeSet Load() = 0;
 
   /// Keeps a commit, all of it or nothing: what was kept survives the end of the process, however it ends.
-  /// `DiskFull`, or `FileIOFailure` with the reason in the log.
-  virtual NMX::IResult Keep(const ChangeSet& changes) = 0;
+  /// `content` is all that was kept before, should it have to be written anew. `DiskFull`, or `FileIOFailure` with the
+  /// reason in the log.
+  virtual NMX::IResult Keep(const ChangeSet& changes, const StoreState& content) = 0;
+
+  /// The last call: sees to it that the content is kept, as far as it can, and tells in the log what is not.
+  virtual void End(const StoreState& /*content*/) noexcept {}
+
+  /// Why commits cannot be kept at present, for people; empty when the latest could be kept. [any]
+  [[nodiscard]] virtual std::string Fault() const { return {}; }
 };
 
 }

@@ -1,22 +1,23 @@
 #pragma once
 
+#include "StandaloneHost/Store/FaultReport.h"
 #include "StandaloneHost/Store/IArchive.h"
+#include "StandaloneHost/Store/SqliteDatabase.h"
+#include "StandaloneHost/Store/WatchedFile.h"
 
 #include <filesystem>
 #include <memory>
 #include <string>
 
-struct sqlite3;
-struct sqlite3_stmt;
-
 namespace Store
 {
 
-/// Keeps the store in one SQLite database file (write-ahead log). While it is open no other process can open it. A
-/// commit that was kept survives a kill of the process; the database survives a loss of power.
+/// Keeps the store in one SQLite database file. While it is open no other process can open it. A commit that was kept
+/// survives a kill of the process; the database survives a loss of power.
 ///
-/// Tables: `subject` (id, kind, name, and the entries that differ from their initial value as JSON), `application`
-/// (path and value), `counter` (the next subject id).
+/// When the disk is full, the file is gone or the like, commits are refused, and the next one tries again: with the
+/// connection there is, then with a new one, and with a new file once the old one is gone. A file that somebody else
+/// has put in its place is not touched.
 class SqliteArchive final : public IArchive
 {
 public:
@@ -26,31 +27,31 @@ public:
   ~SqliteArchive() override;
 
   [[nodiscard]] ChangeSet Load() override;
-  NMX::IResult Keep(const ChangeSet& changes) override;
+  NMX::IResult Keep(const ChangeSet& changes, const StoreState& content) override;
+  void End(const StoreState& content) noexcept override;
+  [[nodiscard]] std::string Fault() const override { return m_fault.Text(); }
 
 private:
-  struct Close
+  /// Whether the files are where they were. Throws DatabaseError when what is there must not be touched.
+  enum class EFiles
   {
-    void operator()(sqlite3* database) const;
+    Present,
+    Gone
   };
-  struct Finalise
-  {
-    void operator()(sqlite3_stmt* statement) const;
-  };
-  using Statement = std::unique_ptr<sqlite3_stmt, Finalise>;
+  [[nodiscard]] EFiles Look() const;
+  void CheckFolder() const;
 
-  [[nodiscard]] Statement Prepare(const char* text);
-  void Execute(const char* text);
-  void PrepareSchema();
-  [[nodiscard]] int UserVersion();
-  void Step(sqlite3_stmt* statement);
-  void RollBack() noexcept;
-  [[noreturn]] void Fail(const std::string& what) const;
+  bool Attempt(const ChangeSet& changes, const StoreState& content);
+  void Open();
+  void Drop();
+  void OpenAgain(const StoreState& content);
+  void MakeAnew(const StoreState& content);
 
-  std::string m_file;
-  std::unique_ptr<sqlite3, Close> m_database;
-  Statement m_begin, m_commit, m_rollback;
-  Statement m_putSubject, m_dropSubject, m_putApplication, m_dropApplication, m_putNextId;
+  const std::string m_writer; // this archive, in what it writes
+  std::string m_firstWriter;  // whoever wrote before it
+  WatchedFile m_file, m_log;
+  FaultReport m_fault;
+  std::unique_ptr<SqliteDatabase> m_database; // none when it could not be opened again
 };
 
 }

@@ -32,11 +32,20 @@ void VStore::BringUpToDate()
   Draft draft(m_state);
   draft.Begin();
   DeriveAll(draft, m_rules);
-  if (!draft.Changes().Empty() && m_archive->Keep(draft.Changes()).Succeeded())
+  if (!draft.Changes().Empty() && m_archive->Keep(draft.Changes(), m_state).Succeeded())
     m_state.Apply(std::move(draft.Changes()));
 }
 
-VStore::~VStore() = default;
+VStore::~VStore()
+{
+  if (m_archive)
+    m_archive->End(m_state);
+}
+
+std::string VStore::Fault() const
+{
+  return m_archive ? m_archive->Fault() : std::string{};
+}
 
 std::unique_ptr<const NMX::IStoreReader> VStore::Reader() const
 {
@@ -87,7 +96,7 @@ IResult VStore::Commit(ChangeSet&& changes, std::unique_lock<std::mutex> edit)
     return EResult::Conflict;
   }
   if (m_archive)
-    if (const IResult kept = m_archive->Keep(changes); kept.Failed())
+    if (const IResult kept = m_archive->Keep(changes, m_state); kept.Failed())
       return kept;
 
   unsigned kinds = 0;

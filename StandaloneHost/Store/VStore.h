@@ -10,6 +10,7 @@
 #include <memory>
 #include <mutex>
 #include <shared_mutex>
+#include <string>
 #include <vector>
 
 namespace Store
@@ -38,6 +39,9 @@ public:
 
   /// True when there is neither a subject nor an application entry that is no setting.
   [[nodiscard]] bool Empty() const;
+
+  /// Why edits cannot be kept at present, for people; empty when the latest could be kept.
+  [[nodiscard]] std::string Fault() const;
 
 private:
   using Callback = NotificationSystem::VMultiCallbackPostal<void()>;

@@ -3,7 +3,8 @@ import QtQuick.Controls
 import QtQuick.Layouts
 import Tavix.SubjectStore.Panel
 
-/// What the server does, what went wrong since the program started, and what has just been done.
+/// What the server does, that edits cannot be kept, what went wrong since the program started, and what has just been
+/// done.
 Rectangle {
     id: bar
 
@@ -65,6 +66,15 @@ Rectangle {
         Label {
             text: bar.rate(bar.server.callsPerSecond)
             color: Theme.secondaryText
+        }
+
+        StatusButton {
+            objectName: "storeFault"
+            visible: bar.server.storeFault !== ""
+            text: "Edits cannot be kept"
+            dot: Theme.critical
+            explanation: "Every edit is refused: " + bar.server.storeFault + ". Click to show or hide the log (Ctrl+L)."
+            onClicked: bar.host.settings.logVisible = !bar.host.settings.logVisible
         }
 
         Label {

@@ -71,9 +71,10 @@ void VWindow::AddCommand(RunaCorePluginInterface::MenuCommand command)
   m_commands.Add(std::move(command));
 }
 
-void VWindow::Show(const Server::VServer& server, std::function<bool()> canClose)
+void VWindow::Show(const Server::VServer& server, std::function<bool()> canClose,
+                   std::function<std::string()> storeFault)
 {
-  m_server = std::make_unique<VServerStatus>(server);
+  m_server = std::make_unique<VServerStatus>(server, std::move(storeFault));
   m_canClose = std::move(canClose);
   m_engine->setInitialProperties({{"host", QVariant::fromValue<QObject*>(this)}});
   m_engine->load(QUrl(ownFolder + "MainWindow.qml"));

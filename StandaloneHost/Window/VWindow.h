@@ -17,6 +17,7 @@
 #include <memory>
 #include <optional>
 #include <stdexcept>
+#include <string>
 
 class QQmlApplicationEngine;
 class QWindow;
@@ -60,8 +61,10 @@ public:
   void AddCommand(RunaCorePluginInterface::MenuCommand command) override;
 
   /// Shows the window, after plugins have added what they have. The server is open and outlives the window; `canClose`
-  /// is asked before the user closes it. Throws WindowError.
-  void Show(const Server::VServer& server, std::function<bool()> canClose);
+  /// is asked before the user closes it, and `storeFault`, now and then, why edits cannot be kept (empty: they can).
+  /// Throws WindowError.
+  void Show(const Server::VServer& server, std::function<bool()> canClose,
+            std::function<std::string()> storeFault = {});
 
   /// Whether the user may close the window now. If so, that is the last moment at which its place is known.
   Q_INVOKABLE [[nodiscard]] bool mayClose();

@@ -1,5 +1,8 @@
 #include "StandaloneHost/Window/VWindowSettings.h"
 
+#include <QDir>
+#include <QFileInfo>
+
 #include <algorithm>
 
 namespace Window
@@ -73,7 +76,8 @@ int VWindowSettings::Number(const QString& key, int least, int most, int fallbac
 
 void VWindowSettings::Keep(const QString& key, const QVariant& value)
 {
-  if (m_file)
+  // The file would make the folder anew, which may be on a disk that is not there at the moment.
+  if (m_file && QFileInfo(m_file->fileName()).dir().exists())
     m_file->setValue(key, value);
 }
 

@@ -16,8 +16,8 @@ namespace Window
 /// it, else in the middle of the first of the `screens` (their usable areas; at least one). Never larger than a screen.
 [[nodiscard]] QRect SaneGeometry(const QRect& kept, const QList<QRect>& screens);
 
-/// How the user has arranged the window, kept in the file "window.ini" of the data folder. Whatever that file holds,
-/// the values are usable. [gui]
+/// How the user has arranged the window, kept in the file "window.ini" of the data folder, as long as that folder is
+/// there. Whatever that file holds, the values are usable. [gui]
 class VWindowSettings final : public QObject
 {
   Q_OBJECT

@@ -112,10 +112,10 @@ export function configuration(subjects, devices = []) {
           '</SubjectConfiguration>', ''].join('\n');
 }
 
-// Without a window, whatever the display, unless an environment is given.
-function launch(options, environment) {
-  const child = spawn(binary, environment ? options : ['--headless', ...options],
-                      { stdio: ['ignore', 'pipe', 'pipe'], env: environment });
+// Without a window, whatever the display, unless an environment is given. `launcher`: a command that becomes the host.
+function launch(options, environment, launcher = []) {
+  const [command, ...rest] = [...launcher, binary, ...(environment ? [] : ['--headless']), ...options];
+  const child = spawn(command, rest, { stdio: ['ignore', 'pipe', 'pipe'], env: environment });
   running.add(child);
   const process = { child, stderr: '' };
   process.listening = new Promise(done => child.stdout.setEncoding('utf8').on('data', text => {
@@ -195,12 +195,12 @@ class Host {
 // Starts a host and waits until it serves calls. `subjects` with `devices`, or `config` (a text) fill an empty
 // store. `environment` takes the place of the environment; only with one may the host have a window.
 export async function startHost({ subjects, devices, config, data = ':memory:', listen = '127.0.0.1:0',
-                                  options = [], environment } = {}) {
+                                  options = [], environment, launcher } = {}) {
   const readyFile = join(temporaryDirectory(), 'ready.json');
   const text = subjects ? configuration(subjects, devices) : config;
   const configurationOptions = text === undefined ? [] : ['--config', temporaryFile('stage.xml', text)];
   const process = launch(['--listen', listen, '--data', data, '--ready-file', readyFile, ...configurationOptions,
-                          ...options], environment);
+                          ...options], environment, launcher);
   let ended;
   process.ended.then(how => { ended = how; }, failure => { ended = failure; });
   const deadline = Date.now() + scaled(15000);

@@ -29,6 +29,9 @@
 
 #include <gmock/gmock.h>
 
+#include <sys/resource.h>
+
+#include <csignal>
 #include <fstream>
 
 using namespace SubjectStoreUI;
@@ -390,6 +393,15 @@ TEST_F(PanelTest, AFileIsCopiedToTheUsersFolderButNeverOverOne)
   const auto copy = [&](VSubjectStoreQml::ESubjectFileType type)
   { return panel.copyFileToUserFolder(url, type).Name(); };
   EXPECT_EQ(panel.Paths(VSubjectStoreQml::ESmartObjectTemplate).size(), 1);
+  rlimit before{};
+  ASSERT_EQ(getrlimit(RLIMIT_FSIZE, &before), 0);
+  const rlimit few{2, before.rlim_max};
+  const auto handler = std::signal(SIGXFSZ, SIG_IGN);
+  ASSERT_EQ(setrlimit(RLIMIT_FSIZE, &few), 0);
+  EXPECT_EQ(copy(VSubjectStoreQml::ESmartObjectTemplate), "FileIOFailure") << "it would be cut short";
+  ASSERT_EQ(setrlimit(RLIMIT_FSIZE, &before), 0);
+  std::signal(SIGXFSZ, handler);
+  EXPECT_TRUE(std::filesystem::is_empty(folder.Path() / "user"));
   const LogCapture log;
   EXPECT_EQ(copy(VSubjectStoreQml::ESmartObjectTemplate), "Ok");
   std::ofstream(file) << "second";

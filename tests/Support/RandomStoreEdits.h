@@ -19,13 +19,16 @@ class RandomStoreEdits
 public:
   explicit RandomStoreEdits(unsigned seed) : m_random(seed) {}
 
-  void Transaction(NMX::IStore& store)
+  void Transaction(NMX::IStore& store) { EXPECT_TRUE(TryTransaction(store).Succeeded()); }
+
+  /// What its commit came to.
+  NMX::IResult TryTransaction(NMX::IStore& store)
   {
     const auto editor = store.Editor();
     const bool emptying = ++m_transactions % 800 < 25;
     for (int edits = emptying ? 4 : 1 + Below(3); edits > 0; --edits)
       Edit(*editor, emptying);
-    EXPECT_TRUE(editor->Commit().Succeeded());
+    return editor->Commit();
   }
 
   int Below(int limit) { return static_cast<int>(m_random() % static_cast<unsigned>(limit)); }

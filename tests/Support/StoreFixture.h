@@ -17,7 +17,7 @@
 struct UnkeptArchive : Store::IArchive
 {
   Store::ChangeSet Load() override { return {{}, {}, NMX::TSubjectStoreId(1)}; }
-  NMX::IResult Keep(const Store::ChangeSet&) override
+  NMX::IResult Keep(const Store::ChangeSet&, const Store::StoreState&) override
   {
     ++commits;
     return full ? NMX::EResult::DiskFull : NMX::EResult::Ok;

@@ -437,7 +437,10 @@ class FullArchive final : public Store::IArchive
 {
 public:
   Store::ChangeSet Load() override { return {{}, {}, TSubjectStoreId(1)}; }
-  NMX::IResult Keep(const Store::ChangeSet& /*changes*/) override { return NMX::EResult::DiskFull; }
+  NMX::IResult Keep(const Store::ChangeSet& /*changes*/, const Store::StoreState& /*content*/) override
+  {
+    return NMX::EResult::DiskFull;
+  }
 };
 
 TEST_F(SubjectConfigurationTest, TellsWhenTheStoreCannotKeepIt)

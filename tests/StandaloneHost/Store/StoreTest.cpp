@@ -319,7 +319,10 @@ TEST(Store, ACommitThatCannotBeKeptChangesNothing)
   struct FullArchive : Store::IArchive
   {
     Store::ChangeSet Load() override { return {{}, {}, TSubjectStoreId(1)}; }
-    IResult Keep(const Store::ChangeSet&) override { return full ? EResult::DiskFull : EResult::Ok; }
+    IResult Keep(const Store::ChangeSet&, const Store::StoreState&) override
+    {
+      return full ? EResult::DiskFull : EResult::Ok;
+    }
     bool full = false;
   };
   auto archive = std::make_unique<FullArchive>();

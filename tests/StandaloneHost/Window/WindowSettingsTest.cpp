@@ -3,6 +3,7 @@
 
 #include <gmock/gmock.h>
 
+#include <filesystem>
 #include <fstream>
 #include <ostream>
 
@@ -67,6 +68,17 @@ TEST(WindowSettings, SurvivesARestart)
   EXPECT_EQ(settings.LogHeight(), 333);
   EXPECT_EQ(settings.Geometry(), QRect(-5, 7, 900, 600));
   EXPECT_TRUE(settings.Maximised());
+}
+
+TEST(WindowSettings, DoesNotMakeAFolderThatIsGone)
+{
+  const TemporaryFolder folder;
+  {
+    VWindowSettings settings(folder.Path() / "data");
+    settings.SetTheme(2);
+    settings.SetGeometry({-5, 7, 900, 600});
+  }
+  EXPECT_TRUE(std::filesystem::is_empty(folder.Path()));
 }
 
 TEST(WindowSettings, TakesNothingFromAFileThatMakesNoSense)

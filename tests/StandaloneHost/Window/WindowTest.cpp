@@ -15,6 +15,10 @@
 
 #include <gmock/gmock.h>
 
+#include <functional>
+#include <string>
+#include <utility>
+
 using RunaCorePluginInterface::MenuCommand;
 using testing::ElementsAre;
 using testing::IsEmpty;
@@ -65,9 +69,9 @@ protected:
     window = std::make_unique<Window::VWindow>(model, folder.Path());
   }
 
-  QWindow& Show(bool canClose = true)
+  QWindow& Show(bool canClose = true, std::function<std::string()> storeFault = {})
   {
-    window->Show(*server, [canClose] { return canClose; });
+    window->Show(*server, [canClose] { return canClose; }, std::move(storeFault));
     QWindow* shown = QGuiApplication::topLevelWindows().first();
     EXPECT_TRUE(QTest::qWaitForWindowExposed(shown));
     return *shown;
@@ -124,6 +128,21 @@ TEST_F(WindowTest, TriggersCommandsByTheirKeysIfTheyArePossible)
   QTest::keyClick(&shown, Qt::Key_R, Qt::ControlModifier);
   QTest::keyClick(&shown, Qt::Key_M, Qt::ControlModifier);
   EXPECT_THAT(triggered, ElementsAre("Ctrl+Shift+P", "Ctrl+R"));
+}
+
+TEST_F(WindowTest, WarnsForAsLongAsEditsCannotBeKept)
+{
+  std::string fault;
+  QWindow& shown = Show(true, [&fault] { return fault; });
+  const auto* warning = shown.findChild<QObject*>("storeFault");
+  ASSERT_NE(warning, nullptr);
+  const auto told = [warning] { return warning->property("visible").toBool(); };
+  EXPECT_FALSE(told());
+  fault = "the disk is full";
+  EXPECT_TRUE(QTest::qWaitFor(told, 5000));
+  EXPECT_TRUE(warning->property("explanation").toString().contains("the disk is full"));
+  fault.clear();
+  EXPECT_TRUE(QTest::qWaitFor([&] { return !told(); }, 5000));
 }
 
 TEST_F(WindowTest, EndsTheEventLoopByItsKeysUnlessThatIsRefused)
