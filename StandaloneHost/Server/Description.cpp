@@ -1,5 +1,7 @@
 #include "StandaloneHost/Server/Description.h"
 
+#include "StandaloneHost/Server/DescriptionParts.h"
+
 #include <boost/json.hpp>
 
 #include <string_view>
@@ -8,17 +10,12 @@ namespace Server
 {
 
 namespace json = boost::json;
-using TerminalServer2::ArgumentType;
-using TerminalServer2::EArgumentType;
+using NMX::EResult;
+using NMX::IResult;
 using TerminalServer2::EDirection;
 
 namespace
 {
-
-std::string_view GroupOf(std::string_view name)
-{
-  return name.substr(0, name.find('.'));
-}
 
 json::array EnumerationValues(const TerminalServer2::TypeRecord& record)
 {
@@ -28,98 +25,24 @@ json::array EnumerationValues(const TerminalServer2::TypeRecord& record)
   return values;
 }
 
-/// The type of an enumeration's number, with what each value is called.
-void DescribeEnumeration(json::object& schema, const TerminalServer2::TypeRecord& record)
-{
-  schema["type"] = "integer";
-  json::array numbers;
-  for (const auto& value : record.values)
-    numbers.push_back(value.number);
-  schema["enum"] = std::move(numbers);
-  schema["x-enumeration"] = record.name;
-}
-
-/// `title` is unique in the document: generators of clients name their types after it.
-json::object Schema(const ArgumentType& type, const std::string& title)
-{
-  json::object schema{{"title", title}};
-  switch (type.type)
-  {
-  case EArgumentType::Bool:
-    schema["type"] = "boolean";
-    break;
-  case EArgumentType::UInt32:
-  case EArgumentType::SessionId:
-    schema["type"] = "integer";
-    schema["minimum"] = 0;
-    schema["maximum"] = 4294967295U;
-    break;
-  case EArgumentType::UInt64:
-    schema["type"] = "integer";
-    schema["minimum"] = 0;
-    schema["maximum"] = 18446744073709551615U;
-    break;
-  case EArgumentType::Double:
-    schema["type"] = "number";
-    break;
-  case EArgumentType::Text:
-    schema["type"] = "string";
-    break;
-  case EArgumentType::TextSet:
-    schema["uniqueItems"] = true;
-    [[fallthrough]];
-  case EArgumentType::TextList:
-    schema["type"] = "array";
-    schema["items"] = {{"title", title + ".Item"}, {"type", "string"}};
-    break;
-  case EArgumentType::Enumeration:
-    DescribeEnumeration(schema, *type.enumeration);
-    break;
-  case EArgumentType::WarningMap:
-  {
-    json::object number{{"title", title + ".Number"}};
-    DescribeEnumeration(number, *type.enumeration);
-    schema["type"] = "array";
-    schema["items"] = {{"title", title + ".Item"},
-                       {"type", "array"},
-                       {"description", "A value of the enumeration and its text."},
-                       {"items", {std::move(number), {{"title", title + ".Text"}, {"type", "string"}}}},
-                       {"minItems", 2},
-                       {"maxItems", 2}};
-    break;
-  }
-  }
-  return schema;
-}
-
 json::object Parameter(std::string_view name, std::string_view description, json::object schema)
 {
   return {{"name", name}, {"description", description}, {"required", true}, {"schema", std::move(schema)}};
 }
 
-/// The schema of a successful answer with the given outputs.
-json::object ResultSchema(const std::string& method, json::object outputs, bool returnsTruth)
+json::object DescribeFailure(IResult code, std::string_view text)
 {
-  json::array names;
-  for (const auto& output : outputs)
-    names.emplace_back(output.key());
-  json::object properties{{"code", {{"title", method + ".Result.Code"}, {"type", "integer"}, {"minimum", 0}}},
-                          {"name", {{"title", method + ".Result.Name"}, {"type", "string"}}},
-                          {"outputs",
-                           {{"title", method + ".Outputs"},
-                            {"type", "object"},
-                            {"properties", std::move(outputs)},
-                            {"required", std::move(names)}}}};
-  json::array required{"code", "name", "outputs"};
-  if (returnsTruth)
-  {
-    properties["returned"] = {{"title", method + ".Result.Returned"}, {"type", "boolean"}};
-    required.emplace_back("returned");
-  }
-  return {{"title", method + ".Result"},
-          {"type", "object"},
-          {"properties", std::move(properties)},
-          {"required", std::move(required)}};
+  return {{"code", static_cast<std::int32_t>(code.Code())},
+          {"message", code.Name()},
+          {"data", {{"code", code.Code()}, {"text", text}}}};
+}
+
+/// With the mark of what should no longer be used, where its documentation says so.
+json::object Marked(json::object described)
+{
+  if (IsDeprecated(described.at("description").as_string()))
+    described["deprecated"] = true;
+  return described;
 }
 
 json::object DescribeFunction(const FunctionEntry& entry)
@@ -133,7 +56,7 @@ json::object DescribeFunction(const FunctionEntry& entry)
   for (std::size_t i = 0; i < types.size() && i < record.arguments.size(); ++i)
   {
     const auto& [name, text] = record.arguments[i];
-    json::object schema = Schema(types[i], method + '.' + std::string(name));
+    json::object schema = ArgumentSchema(types[i], method + '.' + std::string(name));
     if (types[i].direction == EDirection::Input)
       params.push_back(Parameter(name, text, std::move(schema)));
     else
@@ -145,21 +68,20 @@ json::object DescribeFunction(const FunctionEntry& entry)
   json::array errors;
   for (const auto& [code, text] : entry.results)
     if (code.Failed())
-      errors.push_back({{"code", static_cast<std::int32_t>(code.Code())},
-                        {"message", code.Name()},
-                        {"data", {{"code", code.Code()}, {"text", text}}}});
+      errors.push_back(DescribeFailure(code, text));
 
-  return {{"name", record.name},
-          {"description", record.description},
-          {"tags", {{{"name", GroupOf(record.name)}}}},
-          {"paramStructure", "either"},
-          {"params", std::move(params)},
-          {"result",
-           {{"name", "Result"}, {"schema", ResultSchema(method, std::move(outputs), entry.function->ReturnsTruth())}}},
-          {"errors", std::move(errors)},
-          {"x-group", GroupOf(record.name)},
-          {"x-level", entry.level},
-          {"x-resultDocumentation", record.results}};
+  return Marked(
+      {{"name", record.name},
+       {"description", record.description},
+       {"tags", {{{"name", GroupOf(record.name)}}}},
+       {"paramStructure", "either"},
+       {"params", std::move(params)},
+       {"result",
+        {{"name", "Result"}, {"schema", ResultSchema(method, std::move(outputs), entry.function->ReturnsTruth())}}},
+       {"errors", std::move(errors)},
+       {"x-group", GroupOf(record.name)},
+       {"x-level", entry.level},
+       {"x-resultDocumentation", record.results}});
 }
 
 json::object DescribeCallback(const CallbackEntry& entry)
@@ -170,12 +92,12 @@ json::object DescribeCallback(const CallbackEntry& entry)
   for (std::size_t i = 0; i < types.size() && i < record.arguments.size(); ++i)
     params.push_back(
         Parameter(record.arguments[i].name, record.arguments[i].text,
-                  Schema(types[i], std::string(record.name) + '.' + std::string(record.arguments[i].name))));
-  return {{"name", record.name},
-          {"description", record.description},
-          {"params", std::move(params)},
-          {"x-group", GroupOf(record.name)},
-          {"x-level", entry.level}};
+                  ArgumentSchema(types[i], std::string(record.name) + '.' + std::string(record.arguments[i].name))));
+  return Marked({{"name", record.name},
+                 {"description", record.description},
+                 {"params", std::move(params)},
+                 {"x-group", GroupOf(record.name)},
+                 {"x-level", entry.level}});
 }
 
 json::object DescribeType(const TypeEntry& entry)
@@ -186,26 +108,20 @@ json::object DescribeType(const TypeEntry& entry)
           {"values", EnumerationValues(entry.record)}};
 }
 
-json::object DescribeSubscription(std::string_view method, std::string_view description)
+json::object DescribeSubscription(const SubscriptionText& text)
 {
-  const std::string name(method);
-  json::object result = ResultSchema(name, {}, false);
-  json::object& properties = result["properties"].as_object();
-  properties["epoch"] = {
-      {"title", name + ".Epoch"}, {"type", "string"}, {"description", "New at each start of the host."}};
-  properties["sequence"] = {{"title", name + ".Sequence"},
-                            {"type", "integer"},
-                            {"minimum", 0},
-                            {"description", "Later notifications have a greater one."}};
-  return {{"name", method},
-          {"description", description},
-          {"tags", {{{"name", "Server"}}}},
+  const std::string method(text.method);
+  json::array errors;
+  for (const DocumentedFailure& failure : text.failures)
+    errors.push_back(DescribeFailure(failure.code, failure.text));
+  return {{"name", text.method},
+          {"description", text.description},
+          {"tags", {{{"name", GroupOf(text.method)}}}},
           {"paramStructure", "either"},
-          {"params",
-           {Parameter("Name", "Name of a callback, or of a group followed by \".*\" for all its callbacks.",
-                      {{"title", name + ".Name"}, {"type", "string"}})}},
-          {"result", {{"name", "Result"}, {"schema", std::move(result)}}},
-          {"x-group", "Server"},
+          {"params", {Parameter("Name", subscriptionNameText, {{"title", method + ".Name"}, {"type", "string"}})}},
+          {"result", {{"name", "Result"}, {"schema", SubscriptionResultSchema(method)}}},
+          {"errors", std::move(errors)},
+          {"x-group", GroupOf(text.method)},
           {"x-level", 2}};
 }
 
@@ -219,6 +135,22 @@ json::object DescribeDiscovery()
       {"result", {{"name", "Description"}, {"schema", {{"title", "rpc.discover.Description"}, {"type", "object"}}}}},
       {"x-group", "Server"},
       {"x-level", 2}};
+}
+
+json::object DescribeResult(IResult result)
+{
+  return {{"name", result.Name()}, {"code", result.Code()}};
+}
+
+/// Every code that an answer may carry, with its name.
+json::array DescribeResults()
+{
+  json::array results;
+  for (const EResult first : {EResult::Ok, EResult::Failed})
+    for (IResult result = first; !result.Name().empty(); result = IResult(result.Code() + 1))
+      results.push_back(DescribeResult(result));
+  results.push_back(DescribeResult(EResult::NoResult));
+  return results;
 }
 
 template <class Entries, class Describe>
@@ -235,10 +167,8 @@ json::array List(const Entries& entries, Describe describe)
 std::string DescribeApi(const Registry& registry)
 {
   json::array methods = List(registry.Functions(), DescribeFunction);
-  methods.push_back(
-      DescribeSubscription("Server.Subscribe", "Ask to be notified of changes on this connection. Needs a WebSocket."));
-  methods.push_back(DescribeSubscription("Server.Unsubscribe",
-                                         "Ask to be notified no longer on this connection. Needs a WebSocket."));
+  for (const SubscriptionText& text : SubscriptionTexts())
+    methods.push_back(DescribeSubscription(text));
   methods.push_back(DescribeDiscovery());
 
   return json::serialize(json::object{
@@ -246,11 +176,13 @@ std::string DescribeApi(const Registry& registry)
       {"info",
        {{"title", "Subject store remote control"},
         {"version", "1.0.0"},
-        {"description", "Remote control of the subjects of a capture stage. Failures carry the result code as a signed "
-                        "32-bit number; functions of level 1 are a preview."}}},
+        {"description",
+         "Remote control of the subjects of a capture stage. Failures carry the result code as a signed "
+         "32-bit number; functions of level 1 are a preview. The notifications are described by asyncapi.json."}}},
       {"methods", std::move(methods)},
       {"x-callbacks", List(registry.Callbacks(), DescribeCallback)},
-      {"x-types", List(registry.Types(), DescribeType)}});
+      {"x-types", List(registry.Types(), DescribeType)},
+      {"x-results", DescribeResults()}});
 }
 
 }

@@ -1,6 +1,7 @@
 #include "StandaloneHost/Server/Dispatcher.h"
 
-#include "StandaloneHost/Server/Description.h"
+#include "StandaloneHost/Server/DescriptionParts.h"
+#include "StandaloneHost/Server/Greeting.h"
 #include "StandaloneHost/Server/JsonText.h"
 
 #include <algorithm>
@@ -143,46 +144,16 @@ Dispatcher::Dispatcher(const Registry& registry, Notifier& notifier, const Limit
 {
 }
 
-const std::string& Dispatcher::Description() const
+const ApiDocuments& Dispatcher::Api() const
 {
-  if (m_description.empty())
-    m_description = DescribeApi(m_registry);
-  return m_description;
+  if (m_api.hash.empty())
+    m_api = MakeApiDocuments(m_registry);
+  return m_api;
 }
 
 std::string Dispatcher::Hello(std::uint64_t session) const
 {
-  std::string json = "{\"jsonrpc\":\"2.0\",\"method\":\"Server.Hello\",\"params\":{\"session\":";
-  AppendNumber(json, session);
-  json += ",\"epoch\":";
-  AppendString(json, m_epoch);
-  const std::pair<std::string_view, std::size_t> limits[] = {
-      {"messageBytes", m_limits.messageBytes},
-      {"nesting", m_limits.nesting},
-      {"batchCalls", m_limits.batchCalls},
-      {"connections", m_limits.connections},
-      {"webSockets", m_limits.webSockets},
-      {"subscriptions", m_limits.subscriptions},
-      {"callsInFlight", m_limits.callsInFlight},
-      {"callsInFlightOverall", m_limits.callsInFlightOverall},
-      {"outgoingBytes", m_limits.outgoingBytes},
-      {"outgoingBytesOverall", m_limits.outgoingBytesOverall},
-      {"outgoingNotifications", m_limits.outgoingNotifications},
-      {"pingAfterSeconds", static_cast<std::size_t>(m_limits.pingAfter.count())}};
-  char separator = '{';
-  json += ",\"limits\":";
-  for (const auto& [name, limit] : limits)
-  {
-    json += separator;
-    separator = ',';
-    AppendString(json, name);
-    json += ':';
-    AppendNumber(json, std::uint64_t{limit});
-  }
-  json += "},\"levels\":{\"open\":2,\"preview\":1,\"granted\":";
-  AppendNumber(json, std::uint64_t{m_grantedLevel});
-  json += "}}}";
-  return json;
+  return GreetingText({session, m_epoch, Api().hash, m_limits, m_grantedLevel});
 }
 
 std::size_t Dispatcher::Handle(std::string_view text, IListener* listener, Answer answer)
@@ -254,15 +225,16 @@ std::string Dispatcher::CallServer(const Request& request, IListener* listener)
   {
     std::string json;
     AppendHead(json, request.id);
-    json += ",\"result\":" + Description() + '}';
+    json += ",\"result\":" + Api().functions + '}';
     return json;
   }
-  if (request.method == "Server.Subscribe" || request.method == "Server.Unsubscribe")
-    return Subscription(request, listener);
+  for (const SubscriptionText& text : SubscriptionTexts())
+    if (request.method == text.method)
+      return Subscription(text, request, listener);
   return RpcErrorText(request.id, RpcError::methodNotFound, "Method not found: \"" + request.method + '"');
 }
 
-std::string Dispatcher::Subscription(const Request& request, IListener* listener)
+std::string Dispatcher::Subscription(const SubscriptionText& text, const Request& request, IListener* listener)
 {
   static constexpr std::string_view parameter[] = {"Name"};
   std::string ordered(request.params);
@@ -273,18 +245,16 @@ std::string Dispatcher::Subscription(const Request& request, IListener* listener
   if (!texts || texts->size() != 1)
     return RpcErrorText(request.id, RpcError::invalidParams,
                         "expected one text: the name of a callback, or of a group with \".*\"");
-  if (listener == nullptr)
-    return FailureText(request.id, EResult::NotSupported, "Notifications need a WebSocket.", {});
-
-  const IResult result = request.method == "Server.Subscribe"
-                             ? m_notifier.Subscribe(texts->front(), *listener, m_grantedLevel)
-                             : m_notifier.Unsubscribe(texts->front(), *listener);
-  if (result == EResult::NotFound)
-    return FailureText(request.id, result, "No callback with that name.", {});
-  if (result == EResult::AllocationFailure)
-    return FailureText(request.id, result, "Too many subscriptions on this connection.", {});
+  IResult result = EResult::NotSupported;
+  if (listener != nullptr)
+    result = text.method == "Server.Subscribe" ? m_notifier.Subscribe(texts->front(), *listener, m_grantedLevel)
+                                               : m_notifier.Unsubscribe(texts->front(), *listener);
   if (result.Failed())
-    return FailureText(request.id, result, {}, {});
+  {
+    const auto failure = std::find_if(text.failures.begin(), text.failures.end(),
+                                      [&](const DocumentedFailure& documented) { return result == documented.code; });
+    return FailureText(request.id, result, failure == text.failures.end() ? std::string_view{} : failure->text, {});
+  }
 
   std::string json;
   AppendHead(json, request.id);

@@ -1,5 +1,6 @@
 #pragma once
 
+#include "StandaloneHost/Server/ApiDocuments.h"
 #include "StandaloneHost/Server/Envelope.h"
 #include "StandaloneHost/Server/Notifier.h"
 #include "StandaloneHost/Server/Registry.h"
@@ -13,6 +14,8 @@
 
 namespace Server
 {
+
+struct SubscriptionText;
 
 /// Receives the answer to one message, an empty text when there is none to give, and how many calls it was for.
 using Answer = std::function<void(std::string text, std::size_t calls)>;
@@ -35,21 +38,21 @@ public:
   /// The greeting for a new client.
   [[nodiscard]] std::string Hello(std::uint64_t session) const;
 
-  /// The description of everything that is offered, an OpenRPC document.
-  [[nodiscard]] const std::string& Description() const;
+  /// The description of everything that is offered.
+  [[nodiscard]] const ApiDocuments& Api() const;
 
 private:
   void HandleRequest(const Request& request, IListener* listener, Answer answer);
   void Call(const FunctionEntry& entry, const Request& request, Answer answer);
   [[nodiscard]] std::string CallServer(const Request& request, IListener* listener);
-  [[nodiscard]] std::string Subscription(const Request& request, IListener* listener);
+  [[nodiscard]] std::string Subscription(const SubscriptionText& text, const Request& request, IListener* listener);
 
   const Registry& m_registry;
   Notifier& m_notifier;
   const Limits& m_limits;
   const TerminalServer2::Level m_grantedLevel;
   const std::string m_epoch;
-  mutable std::string m_description; // made when first asked for
+  mutable ApiDocuments m_api; // made when first asked for
   std::atomic<std::uint64_t> m_calls{0};
 };
 

@@ -41,7 +41,8 @@ constexpr std::string_view page =
     "<!DOCTYPE html><html lang=\"en\"><meta charset=\"utf-8\"><title>Subject store</title>"
     "<h1>Subject store</h1><p>This is the remote-control server of a subject store. It speaks JSON-RPC 2.0: "
     "<code>POST /rpc</code>, or a WebSocket at <code>/rpc</code>. "
-    "<a href=\"/openrpc.json\">openrpc.json</a> describes every function and callback.</p></html>\n";
+    "<a href=\"/openrpc.json\">openrpc.json</a> describes every function, "
+    "<a href=\"/asyncapi.json\">asyncapi.json</a> every callback.</p></html>\n";
 
 /// Lets the process have as many open files as it has connections, if the system allows it.
 void AllowOpenFiles(std::size_t connections)
@@ -88,7 +89,8 @@ struct VServer::State : std::enable_shared_from_this<State>
   void AddDocuments() const
   {
     core->documents.Add({"/", "text/html; charset=utf-8", std::string(page), true});
-    core->documents.Add({"/openrpc.json", "application/json", core->dispatcher.Description()});
+    core->documents.Add({"/openrpc.json", "application/json", core->dispatcher.Api().functions});
+    core->documents.Add({"/asyncapi.json", "application/json", core->dispatcher.Api().events});
   }
 
   void Accept()

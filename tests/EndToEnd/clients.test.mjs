@@ -9,7 +9,7 @@ import { Client, HTTPTransport, RequestManager, WebSocketTransport } from '@open
 import jsonRpc from 'json-rpc-2.0';
 import WebSocket from 'ws';
 
-import { changed, failure } from './api.mjs';
+import { changed, failure, functions, inputs } from './api.mjs';
 import { inTime, scaled, withHost } from './host.mjs';
 
 const subjects = [
@@ -109,11 +109,39 @@ function openRpc(transport) {
   };
 }
 
+// The package of the repository, as the test TypeScriptClient.Build has compiled it.
+async function subjectStoreClient(host) {
+  const { SubjectStoreClient } = await import('../../clients/typescript/dist/index.js');
+  const mail = mailbox();
+  const client = await SubjectStoreClient.connect(host.ws, { onWarning: warning => mail.put({ warning }) });
+  const byName = (method, params) => {
+    const names = inputs(functions.find(({ name }) => name === method)).map(({ name }) => name);
+    return Array.isArray(params) ? Object.fromEntries(params.map((value, i) => [names[i], value])) : params;
+  };
+  return {
+    async call(method, params) {
+      if (method === 'Server.Subscribe') {
+        await client.on(params[0], told => mail.put({ params: told })).ready; // it keeps the answer to itself
+        return { code: 0, sequence: 0n };
+      }
+      try {
+        return await client.call(method, byName(method, params));
+      } catch (failure) {
+        const { code, name, text } = failure;
+        throw text === undefined ? failure : { code: code | 0, message: name, data: { code, text } };
+      }
+    },
+    notification: () => mail.take(({ warning }) => assert.ifError(warning) ?? true, changed),
+    close: () => client.close(),
+  };
+}
+
 const clients = {
   'curl': { connect: curl },
   'a plain WebSocket': { connect: plainWebSocket, isTold: true },
   'json-rpc-2.0 over WebSocket': { connect: jsonRpc2, isTold: true },
   '@open-rpc/client-js over WebSocket': { connect: host => openRpc(new WebSocketTransport(host.ws)), isTold: true },
+  'the package for TypeScript': { connect: subjectStoreClient, isTold: true },
   '@open-rpc/client-js over HTTP': { connect: host => openRpc(new HTTPTransport(`${host.url}/rpc`)) },
 };
 
@@ -163,7 +191,7 @@ for (const [name, { connect, isTold = false }] of Object.entries(clients)) {
     try {
       await walk(client, isTold);
     } finally {
-      client.close();
+      await client.close();
     }
   }));
 }

@@ -241,9 +241,9 @@ describe('notifications', () => {
     for (let start = 0; start < 2; ++start)
       await withHost({ subjects }, host => withConnection(host, one => withConnection(host, another => {
         for (const { hello } of [one, another]) {
-          const { session, epoch } = hello.params;
+          const { session, epoch, api } = hello.params;
           assert.deepEqual(hello, { jsonrpc: '2.0', method: 'Server.Hello', params: {
-            session, epoch, limits, levels: { open: 2, preview: 1, granted: 2 } } });
+            session, epoch, api, limits, levels: { open: 2, preview: 1, granted: 2 } } });
           assert.ok(Number.isInteger(session));
           assert.equal(epoch, one.hello.params.epoch);
           epochs.add(epoch);

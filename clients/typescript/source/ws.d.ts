@@ -1,0 +1,3 @@
+declare module 'ws' {
+  export const WebSocket: unknown;
+}
