@@ -2,6 +2,7 @@
 
 #include "HostInterface/DebugServices/CallAssertFailHandler.h"
 #include "HostInterface/NMX/GlobalLog.h"
+#include "StandaloneHost/Page/Page.h"
 #include "StandaloneHost/Server/Core.h"
 #include "StandaloneHost/Server/HttpSession.h"
 #include "StandaloneHost/Server/TlsContext.h"
@@ -36,13 +37,6 @@ constexpr auto closingTime = std::chrono::milliseconds(1500);
 constexpr auto acceptPause = std::chrono::milliseconds(100);
 constexpr auto keptTime = std::chrono::seconds(1); // a connection is not ended for another before it is that idle
 constexpr rlim_t otherFiles = 256;                 // what the host needs besides connections
-
-constexpr std::string_view page =
-    "<!DOCTYPE html><html lang=\"en\"><meta charset=\"utf-8\"><title>Subject store</title>"
-    "<h1>Subject store</h1><p>This is the remote-control server of a subject store. It speaks JSON-RPC 2.0: "
-    "<code>POST /rpc</code>, or a WebSocket at <code>/rpc</code>. "
-    "<a href=\"/openrpc.json\">openrpc.json</a> describes every function, "
-    "<a href=\"/asyncapi.json\">asyncapi.json</a> every callback.</p></html>\n";
 
 /// Lets the process have as many open files as it has connections, if the system allows it.
 void AllowOpenFiles(std::size_t connections)
@@ -88,7 +82,8 @@ struct VServer::State : std::enable_shared_from_this<State>
   /// Everything has been registered.
   void AddDocuments() const
   {
-    core->documents.Add({"/", "text/html; charset=utf-8", std::string(page), true});
+    for (const Page::File& file : Page::Files())
+      core->documents.Add({file.target, file.type, std::string(file.content), true});
     core->documents.Add({"/openrpc.json", "application/json", core->dispatcher.Api().functions});
     core->documents.Add({"/asyncapi.json", "application/json", core->dispatcher.Api().events});
   }

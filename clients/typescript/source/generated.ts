@@ -3,7 +3,7 @@
 import type { CallOptions, Caller, Inputs, Method, Outputs, Result } from './types.js';
 
 /** What the greeting of a host with the same API says in `api`. */
-export const apiHash = '62f86651ec76a2edad03676544ff96eb8aa6a361711061a0a7d6870f34445ef1';
+export const apiHash = 'e491c5f7a9482f4d3a197bbfb148f83ef245d515ced6833b2c429d96d3d7fb40';
 
 /** Every result code by name; failures have the highest bit set. */
 export const ResultCode = {
@@ -1231,14 +1231,22 @@ export interface Hello {
     batchCalls: number;
     /** Connections of all clients together. */
     connections: number;
+    /** WebSockets among the connections. */
+    webSockets: number;
     /** Callbacks that a connection subscribes to. */
     subscriptions: number;
     /** Calls of a connection at the same time; more wait. */
     callsInFlight: number;
+    /** Calls of all connections at the same time; more wait. */
+    callsInFlightOverall: number;
     /** Bytes that wait for the client to read them. */
     outgoingBytes: number;
+    /** Bytes that wait for all clients together; beyond, each has its share only. */
+    outgoingBytesOverall: number;
     /** Notifications that wait for the client to read them and may not stand for each other. */
     outgoingNotifications: number;
+    /** Silence after which the client is pinged; as long again, and the connection is ended. */
+    pingAfterSeconds: number;
   };
   levels: {
     /** Level of what everybody may call. */
