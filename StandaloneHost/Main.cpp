@@ -1,4 +1,5 @@
 #include "StandaloneHost/Application.h"
+#include "StandaloneHost/CommandLine/CommandLine.h"
 
 #include <csignal>
 #include <cstdio>
@@ -27,6 +28,8 @@ void BlockSignals()
 
 int main(int argumentCount, char** arguments)
 {
+  if (CommandLine::IsCommandLine(argumentCount, arguments))
+    return CommandLine::RunCommandLine(argumentCount, arguments);
   try
   {
     BlockSignals();

@@ -124,7 +124,10 @@ std::filesystem::path UserDataFolder()
 
 po::options_description Description()
 {
-  po::options_description description("subject-store-host [options]");
+  po::options_description description("subject-store-host [options]   starts a host\n"
+                                      "subject-store-host COMMAND …   talks to a host that runs: call, subscribe, "
+                                      "describe, completion\n"
+                                      "                               (COMMAND --help tells more)\n\nOptions");
   const auto text = [](const char* fallback) { return po::value<std::string>()->default_value(fallback); };
   const auto texts = [] { return po::value<std::vector<std::string>>()->composing(); };
   description.add_options()                                                                     //

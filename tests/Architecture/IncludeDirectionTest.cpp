@@ -53,6 +53,7 @@ const std::map<std::string, std::set<std::string>> allowed{
     {"StandaloneHost/Page", {}},
     {"StandaloneHost/Server", {"StandaloneHost/Page", "HostInterface"}},
     {"StandaloneHost/Simulation", {"HostInterface", "StoreInterface"}},
+    {"StandaloneHost/CommandLine", {"StandaloneHost/Server"}},
     {"StandaloneHost/Window", {"StandaloneHost/Server", "HostInterface"}},
     {"StandaloneHost/Files", {"StandaloneHost/Store", "HostInterface", "StoreInterface"}},
     {"StandaloneHost/Settings", {"StandaloneHost/Store", "HostInterface", "StoreInterface"}},
@@ -67,8 +68,9 @@ const std::map<std::string, std::set<std::string>> allowed{
     {"StandaloneHost",
      {"StandaloneHost/FileIO", "StandaloneHost/Panel", "StandaloneHost/Store", "StandaloneHost/Postal",
       "StandaloneHost/Server", "StandaloneHost/Files", "StandaloneHost/Calibration", "StandaloneHost/Settings",
-      "StandaloneHost/Characters", "StandaloneHost/Evaluation", "StandaloneHost/Simulation",
-      "StandaloneHost/SmartObjects", "StandaloneHost/Window", "HostInterface", "StoreInterface"}},
+      "StandaloneHost/Characters", "StandaloneHost/CommandLine", "StandaloneHost/Evaluation",
+      "StandaloneHost/Simulation", "StandaloneHost/SmartObjects", "StandaloneHost/Window", "HostInterface",
+      "StoreInterface"}},
 };
 
 /// The folder of `allowed` that a file belongs to: the deepest that its path begins with.

@@ -8,8 +8,8 @@ import { join, resolve } from 'node:path';
 import { setTimeout as sleep } from 'node:timers/promises';
 import { fileURLToPath } from 'node:url';
 
-const binary = resolve(process.env.SUBJECT_STORE_HOST ??
-                       fileURLToPath(new URL('../../build/dev/bin/subject-store-host', import.meta.url)));
+export const binary = resolve(process.env.SUBJECT_STORE_HOST ??
+                              fileURLToPath(new URL('../../build/dev/bin/subject-store-host', import.meta.url)));
 
 // The folder with the files that come with the host.
 export function sharedFolder() {
