@@ -5,6 +5,7 @@
 // that it measures. It talks to 127.0.0.1 only.
 
 #include <boost/asio.hpp>
+#include <boost/asio/ssl.hpp>
 #include <boost/program_options.hpp>
 
 #include <algorithm>
@@ -15,6 +16,7 @@
 #include <memory>
 #include <sstream>
 #include <string>
+#include <type_traits>
 #include <vector>
 
 namespace
@@ -24,6 +26,7 @@ namespace asio = boost::asio;
 namespace po = boost::program_options;
 using Clock = std::chrono::steady_clock;
 using Socket = asio::basic_stream_socket<asio::ip::tcp, asio::io_context::executor_type>;
+using TlsStream = asio::ssl::stream<Socket>;
 
 /// Processor time of a process so far, in seconds.
 double ProcessorTime(int pid)
@@ -63,24 +66,39 @@ struct Totals
   bool measuring = false;
 };
 
+struct Plan
+{
+  asio::ip::tcp::endpoint endpoint;
+  std::string path;
+  std::string fields; // more lines for the head of the upgrade, each with its end
+  std::string frame;
+  std::size_t connections;
+  std::size_t inFlight;
+};
+
+template <class Stream>
 class Connection
 {
 public:
-  Connection(asio::io_context& context, std::string frame, Totals& totals)
-      : m_socket(context.get_executor()), m_frame(std::move(frame)), m_totals(totals)
+  Connection(Stream stream, std::string frame, Totals& totals)
+      : m_stream(std::move(stream)), m_frame(std::move(frame)), m_totals(totals)
   {
   }
 
-  void Open(const asio::ip::tcp::endpoint& endpoint, const std::string& path)
+  void Open(const Plan& plan)
   {
-    m_socket.connect(endpoint);
-    m_socket.set_option(asio::ip::tcp::no_delay(true));
-    const std::string request = "GET " + path + " HTTP/1.1\r\nHost: 127.0.0.1:" + std::to_string(endpoint.port()) +
-                                "\r\nUpgrade: websocket\r\nConnection: Upgrade\r\n"
+    m_stream.lowest_layer().connect(plan.endpoint);
+    m_stream.lowest_layer().set_option(asio::ip::tcp::no_delay(true));
+    if constexpr (std::is_same_v<Stream, TlsStream>)
+      m_stream.handshake(TlsStream::client);
+    const std::string request = "GET " + plan.path +
+                                " HTTP/1.1\r\nHost: 127.0.0.1:" + std::to_string(plan.endpoint.port()) + "\r\n" +
+                                plan.fields +
+                                "Upgrade: websocket\r\nConnection: Upgrade\r\n"
                                 "Sec-WebSocket-Key: dGhlIHNhbXBsZSBub25jZQ==\r\nSec-WebSocket-Version: 13\r\n\r\n";
-    asio::write(m_socket, asio::buffer(request));
+    asio::write(m_stream, asio::buffer(request));
     std::string response;
-    asio::read_until(m_socket, asio::dynamic_buffer(response), "\r\n\r\n");
+    asio::read_until(m_stream, asio::dynamic_buffer(response), "\r\n\r\n");
     if (response.compare(9, 3, "101") != 0)
       throw std::runtime_error("no WebSocket: " + response);
     m_input = response.substr(response.find("\r\n\r\n") + 4);
@@ -99,12 +117,12 @@ private:
     std::string frames;
     for (std::size_t i = 0; i < count; ++i)
       frames += m_frame;
-    asio::write(m_socket, asio::buffer(frames));
+    asio::write(m_stream, asio::buffer(frames));
   }
 
   void Read()
   {
-    m_socket.async_read_some(asio::buffer(m_buffer),
+    m_stream.async_read_some(asio::buffer(m_buffer),
                              [this](boost::system::error_code error, std::size_t size)
                              {
                                if (error)
@@ -156,7 +174,7 @@ private:
     return answered;
   }
 
-  Socket m_socket;
+  Stream m_stream;
   const std::string m_frame;
   Totals& m_totals;
   std::string m_input;
@@ -164,6 +182,21 @@ private:
   std::vector<Clock::time_point> m_sent;
   std::size_t m_oldest = 0;
 };
+
+/// Opens the connections and begins to send.
+template <class Stream, class Make>
+std::vector<std::unique_ptr<Connection<Stream>>> Begin(const Plan& plan, Totals& totals, Make make)
+{
+  std::vector<std::unique_ptr<Connection<Stream>>> connections;
+  for (std::size_t i = 0; i < plan.connections; ++i)
+  {
+    connections.push_back(std::make_unique<Connection<Stream>>(make(), plan.frame, totals));
+    connections.back()->Open(plan);
+  }
+  for (auto& connection : connections)
+    connection->Start(plan.inFlight);
+  return connections;
+}
 
 }
 
@@ -176,6 +209,8 @@ int main(int argumentCount, char** arguments)
         ("pid", po::value<int>()->required(), "process of the server")                              //
         ("path", po::value<std::string>()->default_value("/rpc"), "path of the WebSocket")          //
         ("request", po::value<std::string>()->required(), "text of one call")                       //
+        ("token", po::value<std::string>(), "token that the server asks for")                       //
+        ("tls", "encrypt")                                                                          //
         ("connections", po::value<std::size_t>()->default_value(8), "connections")                  //
         ("in-flight", po::value<std::size_t>()->default_value(16), "calls in flight on each")       //
         ("seconds", po::value<double>()->default_value(5), "how long to measure");
@@ -186,15 +221,20 @@ int main(int argumentCount, char** arguments)
     asio::io_context context(1);
     Totals totals;
     totals.latencies.reserve(4U << 20);
-    const asio::ip::tcp::endpoint endpoint(asio::ip::address_v4::loopback(), values["port"].as<unsigned short>());
-    std::vector<std::unique_ptr<Connection>> connections;
-    for (std::size_t i = 0; i < values["connections"].as<std::size_t>(); ++i)
-    {
-      connections.push_back(std::make_unique<Connection>(context, Frame(values["request"].as<std::string>()), totals));
-      connections.back()->Open(endpoint, values["path"].as<std::string>());
-    }
-    for (auto& connection : connections)
-      connection->Start(values["in-flight"].as<std::size_t>());
+    const Plan plan{{asio::ip::address_v4::loopback(), values["port"].as<unsigned short>()},
+                    values["path"].as<std::string>(),
+                    values.count("token") != 0 ? "Authorization: Bearer " + values["token"].as<std::string>() + "\r\n"
+                                               : "",
+                    Frame(values["request"].as<std::string>()),
+                    values["connections"].as<std::size_t>(),
+                    values["in-flight"].as<std::size_t>()};
+    asio::ssl::context tls(asio::ssl::context::tls_client); // the server is known by its port
+    std::vector<std::unique_ptr<Connection<Socket>>> plain;
+    std::vector<std::unique_ptr<Connection<TlsStream>>> encrypted;
+    if (values.count("tls") != 0)
+      encrypted = Begin<TlsStream>(plan, totals, [&] { return TlsStream(Socket(context.get_executor()), tls); });
+    else
+      plain = Begin<Socket>(plan, totals, [&] { return Socket(context.get_executor()); });
 
     context.run_for(std::chrono::seconds(1)); // warms up
     const int pid = values["pid"].as<int>();

@@ -140,12 +140,13 @@ describe('a message', () => {
       for (const answer of withId(null))
         assertRpcError(answer, -32600, [null]);
     }
-    for (const text of await answers('[1,2,3]')) {
-      const batch = JSON.parse(text);
-      assert.equal(batch.length, 3);
-      for (const answer of batch)
-        assertRpcError(answer, -32600, [null]);
-    }
+    for (const [invalid, count] of [['[1]', 1], ['[1,2,3]', 3]])
+      for (const text of await answers(invalid)) {
+        const batch = JSON.parse(text);
+        assert.equal(batch.length, count);
+        for (const answer of batch)
+          assertRpcError(answer, -32600, [null]);
+      }
   });
 
   const unknownMethods = ['foobar', '', 'BasicObjectServices', 'BasicObjectServices.', 'BasicObjectServices.color',

@@ -67,6 +67,102 @@ TEST(Envelope, RefusesWhatIsNoMessage)
   }
 }
 
+TEST(Envelope, TakesExactlyWhatIsJson)
+{
+  using namespace std::string_literals;
+  const Limits limits;
+  // The value at each of the places where a client may put one, and in a batch.
+  const auto messages = [](const std::string& value)
+  {
+    const auto request = [](const std::string& member)
+    { return "{\"jsonrpc\":\"2.0\",\"method\":\"x\"," + member + ",\"id\":1}"; };
+    const std::string position = request("\"params\":[" + value + "]");
+    return std::vector<std::string>{position, request("\"params\":[0,\"\"," + value + " ]"),
+                                    request("\"params\":{\"A\":" + value + "}"), request("\"extra\":" + value),
+                                    "[" + position + "]"};
+  };
+  const auto isJson = [&](const std::string& text) { return !ReadMessage(text, limits).complaint; };
+
+  const std::string sound[] = {"0",
+                               "-0",
+                               "-0.0",
+                               "0e0",
+                               "0E+1",
+                               "-1.5e-3",
+                               "1e400",
+                               "-1e400",
+                               "1e-400",
+                               "123456789012345678901234567890",
+                               std::string(400, '9'),
+                               "0." + std::string(400, '9'),
+                               "\"\"",
+                               R"("\"\\\/\b\f\n\r\t")",
+                               R"("\u0000")",
+                               R"("\u00e9\uD83D\ude00\uffff")",
+                               "\"\x7F\"",
+                               "\"\xC2\x80\xE0\xA0\x80\xED\x9F\xBF\xF0\x90\x80\x80\xF4\x8F\xBF\xBF\"",
+                               "[ ]",
+                               "{ }",
+                               "[[],{},\t[{}]\r\n]",
+                               R"({"":{"":[true,false,null]}})"};
+  for (const std::string& value : sound)
+    for (const std::string& text : messages(value))
+      EXPECT_TRUE(isJson(text)) << text;
+
+  std::vector<std::string> unsound = {
+      // numbers
+      "01", "-01", "00", "-", "--1", "+1", ".5", "-.5", "1.", "1.e1", "1e", "1e+", "1e1.5", "0x1", "1_000", "1,5.",
+      "NaN", "nan", "-NaN", "Infinity", "-Infinity", "inf", "1e5e5", "0 1",
+      // words
+      "nul", "nulll", "True", "FALSE", "undefined", "truefalse", "t",
+      // texts
+      "'a'", "\"a", "a\"", "\"a\"b\"", R"("\x41")", R"("\'")", R"("\u12")", R"("\u12g4")", R"("\U0041")", R"("\ud800")",
+      R"("\udc00")", R"("\ud800\ud800")", R"("\ud800\u0041")", R"("\ud800x")", R"("\udc00\ud800")", R"("\")",
+      // arrays and objects
+      "[1,]", "[,1]", "[1,,2]", "[1 2]", "[1;2]", "[1", "1]", "[1}", "{\"a\":1,}", "{,}", "{a:1}", "{'a':1}",
+      "{\"a\" 1}", "{\"a\":}", "{\"a\"}", "{1:1}", "{\"a\":1 \"b\":2}", "{\"a\":1:2}", "{\"a\"::1}", "(1)", "{\"a\":1",
+      // what stands between values
+      "/*c*/1", "1//c\n", "#c\n1", "\f1", "\v1",
+      "\xC2\xA0"
+      "1",
+      "\xEF\xBB\xBF"
+      "1",
+      "\0"s, "1\0"s, "\0001"s,
+      // bytes that are not UTF-8: cut short, overlong, halves of a pair, beyond the last character, no first bytes
+      "\"\xC3\"", "\"\xE2\x82\"", "\"\xF0\x9F\x98\"", "\"\xC0\x80\"", "\"\xC1\xBF\"", "\"\xE0\x9F\xBF\"",
+      "\"\xF0\x8F\xBF\xBF\"", "\"\xED\xA0\x80\"", "\"\xED\xBF\xBF\"", "\"\xF4\x90\x80\x80\"",
+      "\"\xF8\x88\x80\x80\x80\"", "\"\x80\"", "\"\xBF\"", "\"\xFE\"", "\"\xFF\"", "\"\xC3(\"", "{\"\xC3\":1}"};
+  for (char control = 0; control < 0x20; ++control)
+    unsound.push_back("\"a"s + control + "b\"");
+  for (const std::string& value : unsound)
+    for (const std::string& text : messages(value))
+      EXPECT_FALSE(isJson(text)) << text;
+
+  for (const std::string& wrong : {"\xEF\xBB\xBF"s, "\0"s, "\f"s, ","s, "//c\n"s, ")]}'\n"s, "\xFF"s})
+    for (const std::string& text : {wrong + messages("0")[0], messages("0")[0] + wrong})
+      EXPECT_FALSE(isJson(text)) << text;
+}
+
+TEST(Envelope, CountsNestingFromTheOutsideOfTheMessage)
+{
+  const Limits limits;
+  const auto request = [](std::size_t depth, char open, char close)
+  {
+    std::string value;
+    for (std::size_t i = 0; i < depth; ++i)
+      value += open == '{' && i + 1 < depth ? "{\"a\":" : std::string(1, open);
+    return "{\"jsonrpc\":\"2.0\",\"method\":\"x\",\"params\":" + value + std::string(depth, close) + "}";
+  };
+  for (const auto& [open, close] : {std::pair('[', ']'), std::pair('{', '}')})
+  {
+    // The request is an object already, and the batch an array.
+    EXPECT_FALSE(ReadMessage(request(limits.nesting - 1, open, close), limits).complaint);
+    EXPECT_TRUE(ReadMessage(request(limits.nesting, open, close), limits).complaint);
+    EXPECT_FALSE(ReadMessage("[" + request(limits.nesting - 2, open, close) + "]", limits).complaint);
+    EXPECT_TRUE(ReadMessage("[" + request(limits.nesting - 1, open, close) + "]", limits).complaint);
+  }
+}
+
 TEST(Envelope, RefusesWhatIsNoRequestAndSaysWhy)
 {
   const Limits limits;
