@@ -4,6 +4,7 @@
 #include <boost/json/static_resource.hpp>
 #include <boost/json/stream_parser.hpp>
 
+#include <charconv>
 #include <cmath>
 #include <limits>
 
@@ -115,7 +116,7 @@ IResult ArgumentReader::Next(std::string_view expected, Convert convert)
     return Fail(error == boost::json::error::exponent_overflow ? EResult::InvalidValue : EResult::InvalidFormat,
                 expected);
 
-  const EResult converted = convert(parser.release());
+  const EResult converted = convert(parser.release(), m_text.substr(0, read));
   if (converted != EResult::Ok)
     return Fail(converted, expected);
   m_text.remove_prefix(read);
@@ -125,7 +126,7 @@ IResult ArgumentReader::Next(std::string_view expected, Convert convert)
 IResult ArgumentReader::Bool(bool& value)
 {
   return Next("true or false",
-              [&](const boost::json::value& json)
+              [&](const boost::json::value& json, std::string_view /*token*/)
               {
                 const bool* found = json.if_bool();
                 if (found == nullptr)
@@ -138,7 +139,7 @@ IResult ArgumentReader::Bool(bool& value)
 IResult ArgumentReader::UInt64(std::uint64_t& value)
 {
   return Next("a whole number from 0 to 18446744073709551615",
-              [&](const boost::json::value& json)
+              [&](const boost::json::value& json, std::string_view /*token*/)
               {
                 if (!json.is_number())
                   return EResult::InvalidFormat;
@@ -149,7 +150,7 @@ IResult ArgumentReader::UInt64(std::uint64_t& value)
 IResult ArgumentReader::UInt32(std::uint32_t& value)
 {
   return Next("a whole number from 0 to 4294967295",
-              [&](const boost::json::value& json)
+              [&](const boost::json::value& json, std::string_view /*token*/)
               {
                 if (!json.is_number())
                   return EResult::InvalidFormat;
@@ -164,13 +165,15 @@ IResult ArgumentReader::UInt32(std::uint32_t& value)
 IResult ArgumentReader::Double(double& value)
 {
   return Next("a number",
-              [&](const boost::json::value& json)
+              [&](const boost::json::value& json, std::string_view token)
               {
                 if (!json.is_number())
                   return EResult::InvalidFormat;
-                const double number = json.to_number<double>();
+                // The parser may take a number for the one next to it; only what is too small stays as it has it.
+                double number = json.to_number<double>();
                 if (!std::isfinite(number))
                   return EResult::InvalidValue;
+                (void)std::from_chars(token.data(), token.data() + token.size(), number);
                 value = number;
                 return EResult::Ok;
               });
@@ -179,7 +182,7 @@ IResult ArgumentReader::Double(double& value)
 IResult ArgumentReader::Text(std::string& value)
 {
   return Next("a text",
-              [&](const boost::json::value& json)
+              [&](const boost::json::value& json, std::string_view /*token*/)
               {
                 const auto* found = json.if_string();
                 if (found == nullptr)

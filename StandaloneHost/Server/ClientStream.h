@@ -74,7 +74,7 @@ public:
   void close()
   {
     error_code ignored;
-    m_parts->socket.close(ignored);
+    (void)m_parts->socket.close(ignored);
   }
 
   /// The socket beneath, for what may be asked of it and for what is not to be encrypted.
@@ -107,7 +107,7 @@ private:
   static void EndPlain(Parts& parts, Done done)
   {
     error_code ignored;
-    parts.socket.shutdown(Socket::shutdown_send, ignored);
+    (void)parts.socket.shutdown(Socket::shutdown_send, ignored);
     parts.dropped.resize(droppedAtOnce);
     Drop(parts, std::move(done));
   }

@@ -114,7 +114,7 @@ struct VServer::State : std::enable_shared_from_this<State>
       return;
     }
     error_code ignored;
-    socket.set_option(Tcp::no_delay(true), ignored);
+    (void)socket.set_option(Tcp::no_delay(true), ignored);
     if (core->connections.Count() < core->options.limits.connections || MakeRoom())
       StartHttp(std::move(socket), core);
     else
@@ -158,7 +158,7 @@ struct VServer::State : std::enable_shared_from_this<State>
   {
     core->closing = true;
     error_code ignored;
-    acceptor.close(ignored);
+    (void)acceptor.close(ignored);
     acceptTimer.cancel();
     timer.cancel();
     FinishCalls();

@@ -4,7 +4,10 @@
 
 #include <boost/json.hpp>
 
+#include <array>
+#include <charconv>
 #include <stdexcept>
+#include <string_view>
 #include <utility>
 
 namespace Store
@@ -25,6 +28,27 @@ json::value IdToJson(NMX::TSubjectStoreId id)
 NMX::TSubjectStoreId IdFromJson(const json::value& value)
 {
   return NMX::TSubjectStoreId(value.to_number<std::uint64_t>());
+}
+
+/// As a text: the reader of JSON may take a number for the one next to it.
+json::value DoubleToJson(double value)
+{
+  std::array<char, 32> text;
+  const auto written = std::to_chars(text.data(), text.data() + text.size(), value);
+  return json::value(std::string_view(text.data(), static_cast<std::size_t>(written.ptr - text.data())));
+}
+
+/// A number is what version 1 of the format has.
+double DoubleFromJson(const json::value& value)
+{
+  if (value.is_number())
+    return value.to_number<double>();
+  const json::string& text = value.as_string();
+  double number = 0;
+  const auto read = std::from_chars(text.data(), text.data() + text.size(), number);
+  if (read.ec != std::errc{} || read.ptr != text.data() + text.size())
+    throw std::runtime_error("a number that cannot be read");
+  return number;
 }
 
 json::value WideToJson(const std::wstring& text)
@@ -71,7 +95,7 @@ struct ToJson
   json::value operator()(std::int32_t value) const { return value; }
   json::value operator()(std::uint32_t value) const { return value; }
   json::value operator()(std::uint64_t value) const { return value; }
-  json::value operator()(double value) const { return value; }
+  json::value operator()(double value) const { return DoubleToJson(value); }
   json::value operator()(const std::string& value) const { return json::value(value); }
   json::value operator()(const std::wstring& value) const { return WideToJson(value); }
   json::value operator()(const NMX::Colour& value) const
@@ -82,7 +106,8 @@ struct ToJson
   json::value operator()(const std::vector<NMX::TSubjectStoreId>& value) const { return ListToJson(value, IdToJson); }
   json::value operator()(const std::vector<NMX::Position>& value) const
   {
-    return ListToJson(value, [](const NMX::Position& p) -> json::value { return json::array{p.x, p.y, p.z}; });
+    return ListToJson(value, [](const NMX::Position& p) -> json::value
+                      { return json::array{DoubleToJson(p.x), DoubleToJson(p.y), DoubleToJson(p.z)}; });
   }
   json::value operator()(const std::vector<NMX::SmartCluster>& value) const
   {
@@ -120,7 +145,7 @@ Value FromJson(EValueType type, const json::value& value)
   case EValueType::UInt64:
     return value.to_number<std::uint64_t>();
   case EValueType::Double:
-    return value.to_number<double>();
+    return DoubleFromJson(value);
   case EValueType::Text:
     return TextFromJson(value);
   case EValueType::WideText:
@@ -139,7 +164,7 @@ Value FromJson(EValueType type, const json::value& value)
                                        [](const json::value& p)
                                        {
                                          const auto at = [&](std::size_t index)
-                                         { return p.as_array().at(index).to_number<double>(); };
+                                         { return DoubleFromJson(p.as_array().at(index)); };
                                          return NMX::Position{at(0), at(1), at(2)};
                                        });
   case EValueType::SmartClusters:

@@ -19,7 +19,7 @@ namespace
 {
 
 constexpr int applicationId = 0x53554253; // "SUBS"
-constexpr int schemaVersion = 1;
+constexpr int schemaVersion = 2;          // 1 had numbers with a fraction as numbers; they are read as they are
 
 void BindText(sqlite3_stmt* statement, int place, std::string_view text)
 {
@@ -116,6 +116,8 @@ SqliteDatabase::SqliteDatabase(const std::filesystem::path& file, std::string wr
   Execute("BEGIN EXCLUSIVE");
   if (version == 0)
     PrepareSchema();
+  if (version < schemaVersion)
+    Execute(("PRAGMA user_version = " + std::to_string(schemaVersion)).c_str());
   ReadLastWriter();
   Execute("COMMIT");
   PrepareStatements();
@@ -154,7 +156,6 @@ void SqliteDatabase::PrepareSchema()
   Execute("CREATE TABLE counter(nextSubjectId INTEGER NOT NULL)");
   Execute("INSERT INTO counter VALUES(1)");
   Execute(("PRAGMA application_id = " + std::to_string(applicationId)).c_str());
-  Execute(("PRAGMA user_version = " + std::to_string(schemaVersion)).c_str());
 }
 
 void SqliteDatabase::ReadLastWriter()

@@ -1,16 +1,18 @@
 // What the server does not let strangers do: to listen in, to get in without the token, to keep others out.
 
 import assert from 'node:assert/strict';
-import { execFileSync } from 'node:child_process';
-import { readFileSync, writeFileSync } from 'node:fs';
+import { execFile, execFileSync } from 'node:child_process';
+import { readFileSync } from 'node:fs';
 import https from 'node:https';
 import { join } from 'node:path';
 import { describe, test } from 'node:test';
 import { setTimeout as sleep } from 'node:timers/promises';
 import tls from 'node:tls';
+import { promisify } from 'node:util';
 
+import { SubjectStoreClient } from '../../clients/typescript/dist/index.js';
 import { askColor, crateColor, limits, subjects } from './crate.mjs';
-import { inTime, refusedStart, scaled, temporaryDirectory, temporaryFile, withHost } from './host.mjs';
+import { binary, inTime, refusedStart, scaled, temporaryDirectory, temporaryFile, withHost } from './host.mjs';
 import { Connection, handshake, post, RawSocket, rawRequest, request } from './wire.mjs';
 
 const folder = temporaryDirectory();
@@ -45,6 +47,12 @@ function askEncrypted(host, options = {}) {
   }), 'an answer over https');
 }
 
+// What the program prints as a client of the host.
+async function commandLine(host, ...words) {
+  const { stdout } = await inTime(promisify(execFile)(binary, [...words, '--server', host.url]), words.join(' '));
+  return stdout;
+}
+
 describe('Encrypted', () => {
   test('calls and WebSockets are served, old protocols and plain requests are not',
        () => withHost({ subjects, options: encrypted }, async host => {
@@ -63,6 +71,9 @@ describe('Encrypted', () => {
       .result.outputs.ProximityGroupName, `${longName}299`);
     assert.equal((await connection.nextNotification()).method, 'BasicObjectServices.BasicObjectChangedCallback');
     assert.equal(await connection.close(1000), 1000);
+
+    assert.equal(await commandLine(host, 'call', 'BasicObjectServices.Color', 'Crate', '--tls-ca', certificate), '#ff3366cc\n');
+    await assert.rejects(commandLine(host, 'call', 'BasicObjectServices.Color', 'Crate'), /not trusted/);
 
     const plain = await request({ url: host.url.replace('https', 'http') }, { body: askColor() });
     assert.deepEqual([plain.status, plain.body], [400, 'This port speaks https.\n']);
@@ -107,7 +118,7 @@ describe('Encrypted', () => {
   });
 });
 
-test('A web page shows its token in the list of protocols', () => {
+test('A client that cannot set headers shows its token in the list of protocols', () => {
   const token = '??~~open sesame/42=';
   const file = temporaryFile('token', `${token}\n`);
   return withHost({ subjects, options: ['--token-file', file] }, async host => {
@@ -116,6 +127,10 @@ test('A web page shows its token in the list of protocols', () => {
     assert.equal(connection.socket.protocol, 'subject-store');
     assert.equal((await connection.call('BasicObjectServices.BasicObjectList')).result.code, 0);
     connection.socket.terminate();
+    const typed = await SubjectStoreClient.connect(host.ws, { token });
+    assert.deepEqual((await typed.basicObjectServices.basicObjectList()).Names, ['Barrel', 'Crate']);
+    await typed.close();
+    assert.equal(await commandLine(host, 'call', 'BasicObjectServices.Color', 'Crate', '--token-file', file), '#ff3366cc\n');
     for (const protocols of [['subject-store'], ['subject-store', 'bearer.wrong'], [`bearer.${encoded}x`]])
       await assert.rejects(Connection.open(host, { protocols }), /401/);
     for (const [path, status] of [['/', 200], ['/openrpc.json', 401], ['/nowhere', 401]])

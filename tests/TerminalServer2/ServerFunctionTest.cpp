@@ -75,6 +75,7 @@ protected:
                std::string& sum)
   {
     ++calls;
+    lastFactor = factor;
     sum = name + '|' + std::to_string(flag) + '|' + std::to_string(count) + '|' + std::to_string(factor) + '|' +
           std::to_string(big);
     return EResult::Ok;
@@ -89,6 +90,7 @@ protected:
   std::shared_ptr<VServerFunction<Signature>> function;
   Finished finished;
   int calls = 0;
+  double lastFactor = 0;
 };
 
 }
@@ -107,6 +109,17 @@ TEST_F(ServerFunctionTest, ReadsEveryTypeAndStepsPastTheArrayOnly)
   finished = {};
   EXPECT_EQ(Call(R"(["",false,1.0,3,70e-1])"), "");
   EXPECT_EQ(finished.output, "|0|1|3.000000|7");
+
+  // Exactly the number that is nearest to what is written.
+  for (const auto& [text, number] : {std::pair{"234.20657862927774", 234.20657862927774},
+                                     {"2.5", 2.5},
+                                     {"5e-324", 5e-324},
+                                     {"1e-400", 0.0},
+                                     {"9007199254740993", 9007199254740992.0}})
+  {
+    (void)Call("[\"\",false,1, " + std::string(text) + " ,7]");
+    EXPECT_EQ(lastFactor, number) << text;
+  }
 }
 
 TEST_F(ServerFunctionTest, RefusesWhatDoesNotFitBeforeTheServiceIsAsked)

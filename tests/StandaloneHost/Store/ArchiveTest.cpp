@@ -67,7 +67,8 @@ TEST_F(ArchiveTest, KeepsEveryTypeOfValueExactly)
       {Paths::Enabled(), false},
       {Paths::PresetName(), std::string("Left \"hand\"\n\xC3\xA9")},
       {Paths::ColourRGBA(), NMX::Colour{1, 2, 3, 4}},
-      {Paths::AdditionalMarkerPositions(), std::vector<NMX::Position>{{0.1, -2.5e-7, 1e300}, {}}},
+      {Paths::AdditionalMarkerPositions(),
+       std::vector<NMX::Position>{{0.1, -2.5e-7, 1e300}, {234.20657862927774, -0.0, 5e-324}, {}}},
       {Paths::SmartClusters(), std::vector<NMX::SmartCluster>{{"A", "urn:1", 4294967295U, "Corvex1"}, {}}},
       {NMX::EntryPath("Warnings/WarningBatteryLow"), true},
       {Paths::Flags(), 0x43U}};
@@ -145,9 +146,16 @@ TEST_F(ArchiveTest, RefusesFilesThatItCannotUseAndLeavesThemAsTheyAre)
   std::filesystem::remove(file);
 
   (void)Open();
-  Execute("PRAGMA user_version = 2");
+  Execute("PRAGMA user_version = 3");
   EXPECT_THAT(Refusal(), HasSubstr("written by a later version"));
-  Execute("PRAGMA user_version = 1");
+  Execute("PRAGMA user_version = 1; INSERT INTO application VALUES('Application/Old', '[5,0.25]')");
+  {
+    const auto store = Open();
+    const NMX::Value* old = store->Reader()->FindApplicationEntry(NMX::EntryPath("Application/Old"));
+    ASSERT_NE(old, nullptr);
+    EXPECT_EQ(*old, NMX::Value(0.25)) << "as numbers were kept once";
+  }
+  Execute("DELETE FROM application");
 
   const struct
   {
