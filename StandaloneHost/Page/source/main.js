@@ -7,7 +7,7 @@ import { parse } from './json.js';
 import { Live } from './live.js';
 import { Notifications } from './notifications.js';
 import { groupSection, overview } from './reference.js';
-import { descriptionUrl, fetchDescription, hasToken, rpcUrl, setToken, socketUrl, TokenWanted } from './rpc.js';
+import { descriptionUrl, eventsUrl, fetchDescription, hasToken, rpcUrl, setToken, socketUrl, TokenWanted } from './rpc.js';
 import { askForToken } from './token.js';
 
 const main = document.getElementById('main');
@@ -99,7 +99,7 @@ function show(text) {
     },
   };
   const sections = description.groups.map(group => groupSection(group, services));
-  const first = overview(description, { rpcUrl, socketUrl, descriptionUrl });
+  const first = overview(description, { rpcUrl, socketUrl, descriptionUrl, eventsUrl });
   if (hasToken())
     first.append(forgetButton());
   main.replaceChildren(first, ...sections.map(({ element }) => element));

@@ -100,7 +100,7 @@ function enumerationArticle(record) {
   return article(record, h('table', { className: 'enumeration', 'aria-label': `Values of ${record.name}` },
     h('thead', {}, h('tr', {}, ['Value', 'Name', 'Meaning'].map(title => h('th', { scope: 'col' }, title)))),
     h('tbody', {}, record.values.map(({ value, name, description }) => h('tr', {},
-      h('td', {}, String(value)), h('th', { scope: 'row' }, code(name)), h('td', {}, description ?? ''))))));
+      h('td', {}, String(value)), h('th', { scope: 'row' }, code(breakable(name))), h('td', {}, description ?? ''))))));
 }
 
 const kinds = [
@@ -133,7 +133,7 @@ function firstCall({ functions }) {
 }
 
 // How to call and to listen, above all groups.
-export function overview(description, { rpcUrl, socketUrl, descriptionUrl }) {
+export function overview(description, { rpcUrl, socketUrl, descriptionUrl, eventsUrl }) {
   const link = !hasToken(); // a link could not show it
   const address = (label, url, text, linked) => h('div', {}, h('dt', {}, label), h('dd', {},
     linked ? h('a', { href: url }, code(url)) : code(url), ' ', copyButton(() => url, `Copy the address: ${label}`),
@@ -143,7 +143,8 @@ export function overview(description, { rpcUrl, socketUrl, descriptionUrl }) {
            h('dl', { className: 'addresses' },
              address('Calls', rpcUrl, 'JSON-RPC 2.0: post one request or a batch'),
              address('Calls and notifications', socketUrl, 'WebSocket: the same, and notifications of changes'),
-             address('Description', descriptionUrl, 'for programs (OpenRPC); this page is made from it', link)),
+             address('Description', descriptionUrl, 'for programs (OpenRPC); this page is made from it', link),
+             address('Notifications', eventsUrl, 'what is told over a WebSocket, for programs (AsyncAPI)', link)),
            firstCall(description),
            h('h2', {}, 'Groups'),
            h('ul', { className: 'groups' }, description.groups.map(group => h('li', {},

@@ -8,6 +8,7 @@ const patience = 30000;
 export const rpcUrl = new URL('rpc', document.baseURI).href;
 export const socketUrl = rpcUrl.replace(/^http/, 'ws');
 export const descriptionUrl = new URL('openrpc.json', document.baseURI).href;
+export const eventsUrl = new URL('asyncapi.json', document.baseURI).href;
 
 // The token as long as this tab lives, where the browser keeps anything; otherwise as long as this page.
 let token = '';
