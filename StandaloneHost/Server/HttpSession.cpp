@@ -2,6 +2,7 @@
 
 #include "HostInterface/NMX/GlobalLog.h"
 #include "StandaloneHost/Server/Admission.h"
+#include "StandaloneHost/Server/HttpHead.h"
 #include "StandaloneHost/Server/WebSocketSession.h"
 
 #include <boost/asio/write.hpp>
@@ -30,16 +31,6 @@ constexpr auto handshakeTime = std::chrono::seconds(10);
 constexpr auto idleTime = std::chrono::seconds(60);
 constexpr auto transferTime = std::chrono::seconds(30);
 constexpr auto closingTime = std::chrono::seconds(2);
-
-constexpr std::string_view commonFields = "X-Content-Type-Options: nosniff\r\n";
-
-/// A page may load nothing from elsewhere, and stand in no other page.
-constexpr std::string_view pageFields =
-    "X-Content-Type-Options: nosniff\r\n"
-    "Content-Security-Policy: default-src 'none'; script-src 'self'; style-src 'self'; connect-src 'self'; "
-    "img-src 'self' data:; base-uri 'none'; form-action 'none'; frame-ancestors 'none'\r\n"
-    "Referrer-Policy: no-referrer\r\n"
-    "Cache-Control: no-store\r\n";
 
 struct Refusal
 {
@@ -277,7 +268,9 @@ private:
       return Respond(http::status::not_found, "text/plain; charset=utf-8", "There is nothing here.\n");
     if (method != http::verb::get)
       return RespondWithAllow("GET, OPTIONS", "This can only be read.\n");
-    Respond(http::status::ok, document->type, document->text);
+    // The document outlives the answer: many who read it slowly take no memory for it.
+    m_reply = HeadText(Head(http::status::ok, document->type, {}), document->text.size(), 0);
+    Send(boost::asio::buffer(document->text));
   }
 
   void Call()
@@ -303,60 +296,43 @@ private:
 
   void RespondWithAllow(std::string_view methods, std::string_view text)
   {
-    m_reply.assign("Allow: ").append(methods).append("\r\n");
-    Send(http::status::method_not_allowed, "text/plain; charset=utf-8", text);
+    const std::string allow = "Allow: " + std::string(methods) + "\r\n";
+    Respond(http::status::method_not_allowed, "text/plain; charset=utf-8", text, allow);
   }
 
-  void Respond(http::status status, std::string_view type, std::string_view body)
+  /// Answers with a text of which a copy is sent, and with fields of this answer alone.
+  void Respond(http::status status, std::string_view type, std::string_view body, std::string_view fields = {})
   {
-    m_reply.clear();
     if (status == http::status::unauthorized)
-      m_reply += "WWW-Authenticate: Bearer\r\n";
-    Send(status, type, body);
+      fields = "WWW-Authenticate: Bearer\r\n";
+    m_reply = HeadText(Head(status, type, fields), body.size(), body.size());
+    m_reply += body;
+    Send({});
   }
 
-  /// Sends an answer whose first fields may stand in the reply already. It is worded by hand, in one piece: Beast's
-  /// way of many small buffers costs as much as carrying out the call.
-  void Send(http::status status, std::string_view type, std::string_view body)
+  [[nodiscard]] HttpHead Head(http::status status, std::string_view type, std::string_view fields)
   {
     m_keepAlive = m_keepAlive && !m_core->closing;
-    const std::string fields = std::move(m_reply);
-    m_reply.clear();
-    m_reply.reserve(fields.size() + body.size() + 1024);
-    m_reply += "HTTP/1.1 ";
-    m_reply += std::to_string(static_cast<unsigned>(status));
-    m_reply += ' ';
-    m_reply += ToView(http::obsolete_reason(status));
-    m_reply += "\r\n";
-    m_reply += fields;
-    const auto field = [this](std::string_view name, std::string_view value)
-    { m_reply.append(name).append(": ").append(value).append("\r\n"); };
-    if (!type.empty())
-      field("Content-Type", type);
-    m_reply += type.starts_with("text/html") ? pageFields : commonFields;
-    if (!m_origin.empty())
-    {
-      // The origin was admitted.
-      field("Access-Control-Allow-Origin", m_origin);
-      field("Access-Control-Allow-Headers", "Authorization, Content-Type");
-      field("Access-Control-Allow-Methods", "GET, POST");
-      field("Vary", "Origin");
-    }
-    if (!m_keepAlive || m_oldVersion)
-      field("Connection", m_keepAlive ? "keep-alive" : "close");
-    if (status != http::status::no_content)
-      field("Content-Length", std::to_string(body.size()));
-    m_reply += "\r\n";
-    m_reply += body;
+    return {status, fields, type, m_origin, m_keepAlive, m_oldVersion};
+  }
+
+  /// Sends the reply, and after it what stays where it is.
+  void Send(boost::asio::const_buffer rest)
+  {
     AwaitClient(transferTime);
-    boost::asio::async_write(m_stream, boost::asio::buffer(m_reply),
-                             [self = shared_from_this()](error_code error, std::size_t) { self->OnSent(error); });
+    const auto sent = [self = shared_from_this()](error_code error, std::size_t) { self->OnSent(error); };
+    if (rest.size() == 0)
+      boost::asio::async_write(m_stream, boost::asio::buffer(m_reply), sent);
+    else
+      boost::asio::async_write(m_stream, std::array{boost::asio::const_buffer(boost::asio::buffer(m_reply)), rest},
+                               sent);
   }
 
   void OnSent(error_code error)
   {
     if (error)
       return Abort();
+    std::string().swap(m_reply);
     if (m_keepAlive)
       return Read();
     // The rest of what the client sends is read and dropped for a while: to close on it would take back the answer.
