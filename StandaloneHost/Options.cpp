@@ -1,14 +1,14 @@
 #include "StandaloneHost/Options.h"
 
+#include "StandaloneHost/Server/TokenFile.h"
+
 #include <boost/asio/ip/address.hpp>
 #include <boost/program_options.hpp>
 #include <boost/regex.hpp>
 
-#include <algorithm>
 #include <array>
 #include <charconv>
 #include <cstdlib>
-#include <fstream>
 #include <sstream>
 #include <string_view>
 #include <utility>
@@ -78,26 +78,16 @@ void CheckOrigin(const std::string& origin)
         Quoted(origin));
 }
 
-/// The first line of a file: what fits into a header, so that every client can present it.
 std::string ReadToken(const std::filesystem::path& file)
 {
-  constexpr std::size_t longest = 512;
-  std::ifstream in(file);
-  std::string token(longest + 2, '\0');
-  if (!std::filesystem::is_regular_file(file) || !in)
-    throw OptionError("--token-file: cannot read a token from " + Quoted(file.string()));
-  in.read(token.data(), static_cast<std::streamsize>(token.size()));
-  token.resize(static_cast<std::size_t>(in.gcount()));
-  token.resize(std::min(token.find('\n'), token.size()));
-  while (!token.empty() && (token.back() == '\r' || token.back() == ' '))
-    token.pop_back();
-  if (token.empty())
-    throw OptionError("--token-file: the first line of " + Quoted(file.string()) + " is empty");
-  const bool fits = std::all_of(token.begin(), token.end(), [](char c) { return c >= ' ' && c <= '~'; });
-  if (!fits || token.front() == ' ' || token.size() > longest)
-    throw OptionError("--token-file: the first line of " + Quoted(file.string()) + " is not up to " +
-                      std::to_string(longest) + " printable ASCII characters");
-  return token;
+  try
+  {
+    return Server::ReadTokenFile(file);
+  }
+  catch (const Server::ServerError& failure)
+  {
+    throw OptionError(std::string("--token-file: ") + failure.what());
+  }
 }
 
 std::chrono::seconds PingTime(const std::string& text)

@@ -59,6 +59,9 @@ int Run(const Command& command, std::span<const std::string> words)
     Print(HelpText(command));
     return 0;
   }
+  if (command.talks)
+    if (const Target target = invocation.Host(); target.ShowsToken())
+      Tell("everybody on the way to " + target.Url() + " can read the token; https:// hides it");
   return command.run(invocation);
 }
 

@@ -2,6 +2,8 @@
 
 #include "StandaloneHost/CommandLine/CommandError.h"
 #include "StandaloneHost/CommandLine/Layout.h"
+#include "StandaloneHost/Server/TokenFile.h"
+#include "StandaloneHost/Server/VServer.h"
 
 #include <boost/program_options.hpp>
 
@@ -50,6 +52,18 @@ po::options_description Describe(const Command& command)
   return description;
 }
 
+std::string ReadToken(const std::string& file)
+{
+  try
+  {
+    return Server::ReadTokenFile(file);
+  }
+  catch (const Server::ServerError& failure)
+  {
+    throw UsageError(std::string("--token-file: ") + failure.what());
+  }
+}
+
 }
 
 std::string Invocation::Value(std::string_view option) const
@@ -70,7 +84,7 @@ Target Invocation::Host() const
   Target target = ParseServer(given("server", "SUBJECT_STORE_SERVER", "http://127.0.0.1:8420"));
   const bool noToken = !Has("token-file") && Environment("SUBJECT_STORE_TOKEN_FILE").empty();
   if (!noToken)
-    target.token = ReadTokenFile(given("token-file", "SUBJECT_STORE_TOKEN_FILE", ""));
+    target.token = ReadToken(given("token-file", "SUBJECT_STORE_TOKEN_FILE", ""));
   target.authority = given("tls-ca", "SUBJECT_STORE_TLS_CA", "");
   if (Has("timeout"))
     target.timeout = ParseSeconds(Value("timeout"), "timeout");

@@ -5,9 +5,7 @@
 
 #include <boost/regex.hpp>
 
-#include <algorithm>
 #include <charconv>
-#include <fstream>
 
 namespace CommandLine
 {
@@ -21,6 +19,12 @@ std::string Target::HostAndPort() const
 std::string Target::Url() const
 {
   return (tls ? "https://" : "http://") + HostAndPort();
+}
+
+bool Target::ShowsToken() const
+{
+  const bool here = host == "localhost" || host == "::1" || host.starts_with("127.");
+  return !token.empty() && !tls && !here;
 }
 
 Target ParseServer(const std::string& url)
@@ -37,24 +41,6 @@ Target ParseServer(const std::string& url)
   if (std::stoi(target.port) < 1 || std::stoi(target.port) > 65535)
     throw UsageError("--server: expected a port from 1 to 65535, got " + Quoted(target.port));
   return target;
-}
-
-std::string ReadTokenFile(const std::string& file)
-{
-  constexpr std::size_t longest = 4096;
-  std::ifstream in(file);
-  char text[longest + 1];
-  in.read(text, sizeof text);
-  std::string token(text, static_cast<std::size_t>(in.gcount()));
-  if (in.bad() || token.empty())
-    throw UsageError("--token-file: cannot read a token from " + Quoted(file));
-  token.erase(std::min(token.find('\n'), token.size()));
-  while (!token.empty() && (token.back() == '\r' || token.back() == ' '))
-    token.pop_back();
-  const bool printable = std::all_of(token.begin(), token.end(), [](char c) { return c >= 0x20 && c < 0x7F; });
-  if (token.empty() || token.size() == longest + 1 || !printable)
-    throw UsageError("--token-file: the first line of " + Quoted(file) + " is not a token");
-  return token;
 }
 
 std::chrono::milliseconds ParseSeconds(const std::string& text, const std::string& option)

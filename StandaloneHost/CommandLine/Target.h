@@ -19,15 +19,15 @@ struct Target
   /// The address as people write it.
   [[nodiscard]] std::string Url() const;
 
+  /// Whether the token can be read by others on its way: it leaves this machine without encryption.
+  [[nodiscard]] bool ShowsToken() const;
+
   /// As in the header "Host".
   [[nodiscard]] std::string HostAndPort() const;
 };
 
 /// Takes http(s)://HOST[:PORT] or ws(s)://HOST[:PORT] apart; "/" or "/rpc" may follow. Throws CommandError.
 [[nodiscard]] Target ParseServer(const std::string& url);
-
-/// The token in the first line of a file. Throws CommandError.
-[[nodiscard]] std::string ReadTokenFile(const std::string& file);
 
 /// A time in seconds, such as "2" or "0.5". Throws CommandError, which names the option.
 [[nodiscard]] std::chrono::milliseconds ParseSeconds(const std::string& text, const std::string& option);

@@ -244,6 +244,10 @@ void VServer::Open()
   }
   const bool isV6 = options.address.find(':') != std::string::npos;
   m_state->address = (isV6 ? '[' + options.address + ']' : options.address) + ':' + std::to_string(m_state->port);
+  if (!options.Encrypted() && !asio::ip::make_address(options.address).is_loopback())
+    NMX::Log(NMX::serverLog, NMX::ESeverity::Warning,
+             "Everybody on the network can read the token and all that is said: %1%",
+             "--tls-cert and --tls-key encrypt it.");
   AllowOpenFiles(options.limits.connections);
   m_state->AddDocuments();
   m_state->open = true;

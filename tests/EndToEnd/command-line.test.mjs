@@ -129,7 +129,9 @@ describe('call', () => {
       await fails(host, ['call', 'BasicObjectList'], 3, /401.*--token-file/);
       await fails(host, ['call', 'BasicObjectList', '--token-file', temporaryFile('wrong', 'x\n')], 3, /401/);
       const spoilt = temporaryFile('spoilt', 'a\rX-Other: b\n');
-      await fails(host, ['call', 'BasicObjectList', '--token-file', spoilt], 2, /not a token/);
+      await fails(host, ['call', 'BasicObjectList', '--token-file', spoilt], 2, /printable ASCII/);
+      const open = await run(undefined, ['call', 'x', '--token-file', token, '--server', 'http://[::ffff:127.0.0.1]:1']);
+      assert.match(open.stderr, /can read the token/);
     });
   });
 });
