@@ -20,7 +20,7 @@ constexpr TerminalServer2::ArgumentText texts[] = {{"Able", ""}};
 
 struct Listener final : IListener
 {
-  explicit Listener(const Limits& limits) : queue(limits) {}
+  Listener(const Limits& limits, std::size_t& waiting) : queue(limits, waiting) {}
   void Notify(const SharedMessage& message, EPolicy policy, const void* callback) override
   {
     (void)queue.Push(message, policy, callback);
@@ -52,9 +52,10 @@ void OneNotification(benchmark::State& state)
       2, NMX::MakeShared<Callback>(TerminalServer2::FunctionRecord{"Group.AbleChangedCallback", "", texts, ""},
                                    multiCallback, postal));
   Notifier notifier(registry, limits);
+  std::size_t waiting = 0;
   std::deque<Listener> listeners;
   for (int i = 0; i < state.range(0); ++i)
-    (void)notifier.Subscribe("Group.AbleChangedCallback", listeners.emplace_back(limits), 2);
+    (void)notifier.Subscribe("Group.AbleChangedCallback", listeners.emplace_back(limits, waiting), 2);
   for (auto _ : state)
   {
     multiCallback->Fire(true);
