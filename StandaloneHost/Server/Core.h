@@ -103,12 +103,12 @@ class CallsInFlight
 public:
   explicit CallsInFlight(std::size_t limit) : m_limit(limit) {}
 
-  /// False when there are too many; `connection` will be told to read on.
-  [[nodiscard]] bool MayBegin(const std::weak_ptr<IConnection>& connection)
+  /// False when there are too many; `connection` is kept, as it waits for nothing else, and told to read on.
+  [[nodiscard]] bool MayBegin(std::shared_ptr<IConnection> connection)
   {
     if (m_count < static_cast<std::ptrdiff_t>(m_limit))
       return true;
-    m_waiting.push_back(connection);
+    m_waiting.push_back(std::move(connection));
     return false;
   }
 
@@ -118,17 +118,16 @@ public:
     m_count += calls;
     while (m_count < static_cast<std::ptrdiff_t>(m_limit) && !m_waiting.empty())
     {
-      const auto next = m_waiting.front().lock();
+      const auto next = std::move(m_waiting.front());
       m_waiting.pop_front();
-      if (next)
-        next->ReadOn();
+      next->ReadOn();
     }
   }
 
 private:
   const std::size_t m_limit;
   std::ptrdiff_t m_count = 0;
-  std::deque<std::weak_ptr<IConnection>> m_waiting;
+  std::deque<std::shared_ptr<IConnection>> m_waiting;
 };
 
 /// What the connections of a server share. [server]

@@ -101,8 +101,8 @@ public:
       return Abort();
     if (!m_open || m_closing)
       return;
-    // While calls are carried out, nothing may be read.
-    if (m_stream.next_layer().TakeSignOfLife() || m_callsInFlight > 0)
+    // While calls are carried out or waited for, nothing may be read.
+    if (m_stream.next_layer().TakeSignOfLife() || m_callsInFlight > 0 || m_waitsForOthers)
     {
       m_lastSign = now;
       m_pinged = false;
@@ -153,7 +153,7 @@ private:
       return;
     if (m_callsInFlight >= static_cast<std::ptrdiff_t>(m_core->options.limits.callsInFlight))
       return;
-    m_waitsForOthers = !m_core->calls.MayBegin(weak_from_this());
+    m_waitsForOthers = !m_core->calls.MayBegin(shared_from_this());
     if (m_waitsForOthers)
       return;
     m_reading = true;
