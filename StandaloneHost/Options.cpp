@@ -7,6 +7,7 @@
 #include <boost/regex.hpp>
 
 #include <array>
+#include <cctype>
 #include <charconv>
 #include <cstdlib>
 #include <sstream>
@@ -90,12 +91,40 @@ std::string ReadToken(const std::filesystem::path& file)
   }
 }
 
-std::chrono::seconds PingTime(const std::string& text)
+/// Sets the limits that are given. What is not given follows from what is.
+void ReadLimits(const po::variables_map& values, Server::Limits& limits)
 {
-  const auto seconds = ParseNumber<std::uint16_t>(text, "ping-after");
-  if (seconds == 0 || seconds > 3600)
-    throw OptionError("--ping-after: expected 1 to 3600 seconds, got " + Quoted(text));
-  return std::chrono::seconds(seconds);
+  for (const Server::LimitRow& row : Server::LimitRows())
+  {
+    const std::string option(row.option);
+    if (values.count(option) == 0)
+      continue;
+    const auto& text = values[option].as<std::string>();
+    const auto number = ParseNumber<std::uint64_t>(text, option);
+    if (number < row.smallest || number > row.largest)
+      throw OptionError("--" + option + ": expected " + std::to_string(row.smallest) + " to " +
+                        std::to_string(row.largest) + ", got " + Quoted(text));
+    limits.*row.member = number;
+  }
+  if (values.count("max-websockets") == 0)
+    limits.webSockets = Server::Limits::WebSocketsAmong(limits.connections);
+  if (limits.webSockets > limits.connections)
+    throw OptionError("--max-websockets: expected at most " + std::to_string(limits.connections) +
+                      ", the number of connections, got " + std::to_string(limits.webSockets));
+}
+
+/// An option for each limit of the server.
+void AddLimits(po::options_description& description)
+{
+  const Server::Limits usual;
+  for (const Server::LimitRow& row : Server::LimitRows())
+  {
+    std::string text(row.description);
+    text.front() = static_cast<char>(std::tolower(static_cast<unsigned char>(text.front())));
+    text.back() = ' ';
+    text += "(default: " + std::to_string(usual.*row.member) + ")";
+    description.add_options()(std::string(row.option).c_str(), po::value<std::string>(), text.c_str());
+  }
 }
 
 std::filesystem::path UserDataFolder()
@@ -131,7 +160,6 @@ po::options_description Description()
       ("tls-cert", po::value<std::string>(), "PEM file with the certificate: serves https and wss; needs --tls-key") //
       ("tls-key", po::value<std::string>(), "PEM file with the certificate's private key")                           //
       ("allow-origin", texts(), "origin of a web page that may connect (repeatable)")                                //
-      ("ping-after", text("30"), "seconds of silence after which a WebSocket client is pinged")                      //
       ("features", text("0xFFFFFFFF"), "feature mask, decimal or 0x...")                                             //
       ("level", text("2"), "2, or 1 to open the preview functions as well")                                          //
       ("character-calibration-time", text("3000"),
@@ -143,6 +171,7 @@ po::options_description Description()
       ("ready-file", po::value<std::string>(), "file to write once calls are served")              //
       ("plugin-file", po::value<std::string>(), "plugin module to load (default: the host's own)") //
       ("log", text("notice"), "error, warning, notice, info, debug or trace");
+  AddLimits(description);
   return description;
 }
 
@@ -199,7 +228,7 @@ Request ReadOptions(int argumentCount, const char* const* arguments)
   options.server.tlsKey = given("tls-key");
   if (options.server.tlsCertificate.empty() != options.server.tlsKey.empty())
     throw OptionError("--tls-cert and --tls-key: one needs the other");
-  options.server.limits.pingAfter = PingTime(given("ping-after"));
+  ReadLimits(values, options.server.limits);
   options.server.allowedOrigins = list("allow-origin");
   for (const std::string& origin : options.server.allowedOrigins)
     CheckOrigin(origin);

@@ -20,11 +20,12 @@ constexpr TerminalServer2::ArgumentText texts[] = {{"Able", ""}};
 
 struct Listener final : IListener
 {
-  Listener(const Limits& limits, std::size_t& waiting) : queue(limits, waiting) {}
+  Listener(const Limits& limits, const std::shared_ptr<OutgoingBytes>& waiting) : queue(limits, waiting) {}
   void Notify(const SharedMessage& message, EPolicy policy, const void* callback) override
   {
     (void)queue.Push(message, policy, callback);
-    benchmark::DoNotOptimize(queue.Pop());
+    benchmark::DoNotOptimize(SharedMessage(queue.Front()));
+    queue.Pop();
   }
   OutgoingQueue queue;
 };
@@ -52,7 +53,7 @@ void OneNotification(benchmark::State& state)
       2, NMX::MakeShared<Callback>(TerminalServer2::FunctionRecord{"Group.AbleChangedCallback", "", texts, ""},
                                    multiCallback, postal));
   Notifier notifier(registry, limits);
-  std::size_t waiting = 0;
+  const auto waiting = std::make_shared<OutgoingBytes>(limits);
   std::deque<Listener> listeners;
   for (int i = 0; i < state.range(0); ++i)
     (void)notifier.Subscribe("Group.AbleChangedCallback", listeners.emplace_back(limits, waiting), 2);

@@ -1,10 +1,12 @@
 #include "StandaloneHost/Server/Admission.h"
 
 #include <boost/asio/ip/address.hpp>
+#include <boost/beast/core/string.hpp>
 #include <openssl/crypto.h>
 #include <openssl/evp.h>
 
 #include <algorithm>
+#include <optional>
 #include <string>
 
 namespace Server
@@ -51,11 +53,21 @@ bool SameSecret(std::string_view given, std::string_view secret)
   return given.size() == secret.size() && CRYPTO_memcmp(given.data(), secret.data(), secret.size()) == 0;
 }
 
+/// What follows the scheme "Bearer", whose case does not matter; nothing when there is another scheme.
+std::optional<std::string_view> BearerToken(std::string_view authorisation)
+{
+  constexpr std::string_view scheme = "bearer ";
+  const std::string_view begin = authorisation.substr(0, scheme.size());
+  if (!boost::beast::iequals({begin.data(), begin.size()}, {scheme.data(), scheme.size()}))
+    return std::nullopt;
+  authorisation.remove_prefix(std::min(authorisation.find_first_not_of(' ', scheme.size()), authorisation.size()));
+  return authorisation;
+}
+
 bool PresentsToken(const Visitor& visitor, const std::string& token)
 {
-  constexpr std::string_view scheme = "Bearer ";
-  if (visitor.authorisation.starts_with(scheme))
-    return SameSecret(visitor.authorisation.substr(scheme.size()), token);
+  if (const auto given = BearerToken(visitor.authorisation))
+    return SameSecret(*given, token);
   constexpr std::string_view prefix = "bearer.";
   const std::string encoded = visitor.protocols.empty() ? std::string{} : Base64Url(token);
   return AnyOf(visitor.protocols, [&](std::string_view protocol)

@@ -8,6 +8,7 @@
 #include <array>
 #include <stdexcept>
 #include <string_view>
+#include <utility>
 
 namespace Server
 {
@@ -35,8 +36,9 @@ std::string Sha256(std::string_view text)
 
 ApiDocuments MakeApiDocuments(const Registry& registry)
 {
-  ApiDocuments documents{DescribeApi(registry), DescribeEvents(registry), {}};
-  documents.hash = Sha256(documents.functions + documents.events);
+  const auto share = [](std::string text) { return std::make_shared<const std::string>(std::move(text)); };
+  ApiDocuments documents{share(DescribeApi(registry)), share(DescribeEvents(registry)), {}};
+  documents.hash = Sha256(*documents.functions + *documents.events);
   return documents;
 }
 

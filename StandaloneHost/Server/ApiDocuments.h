@@ -2,6 +2,7 @@
 
 #include "StandaloneHost/Server/Registry.h"
 
+#include <memory>
 #include <string>
 
 namespace Server
@@ -11,9 +12,9 @@ namespace Server
 /// program has the same documents wherever and whenever it runs.
 struct ApiDocuments
 {
-  std::string functions; ///< OpenRPC
-  std::string events;    ///< AsyncAPI
-  std::string hash;      ///< SHA-256 of the two, one after the other, in hexadecimal
+  std::shared_ptr<const std::string> functions; ///< OpenRPC
+  std::shared_ptr<const std::string> events;    ///< AsyncAPI
+  std::string hash;                             ///< SHA-256 of the two, one after the other, in hexadecimal
 };
 
 /// Throws std::runtime_error when the hash cannot be computed.

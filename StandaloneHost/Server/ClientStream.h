@@ -25,8 +25,9 @@ public:
   using executor_type = boost::asio::io_context::executor_type;
   using error_code = boost::system::error_code;
 
-  /// With `tls` the stream is of use after the handshake.
-  ClientStream(Socket socket, boost::asio::ssl::context* tls) : m_parts(std::make_unique<Parts>(std::move(socket), tls))
+  /// `peer`: the client's address, for people. With `tls` the stream is of use after the handshake.
+  ClientStream(Socket socket, std::string peer, boost::asio::ssl::context* tls)
+      : m_parts(std::make_unique<Parts>(std::move(socket), std::move(peer), tls))
   {
   }
 
@@ -80,25 +81,21 @@ public:
   /// The socket beneath, for what may be asked of it and for what is not to be encrypted.
   Socket& Plain() { return m_parts->socket; }
 
-  /// The client's address as text; empty when it has gone.
-  [[nodiscard]] std::string Peer() const
-  {
-    error_code error;
-    const auto endpoint = m_parts->socket.remote_endpoint(error);
-    return error ? std::string{} : endpoint.address().to_string();
-  }
+  /// The client's address as text, also when it has gone.
+  [[nodiscard]] const std::string& Peer() const { return m_parts->peer; }
 
 private:
   static constexpr std::size_t droppedAtOnce = 16384;
 
   struct Parts
   {
-    Parts(Socket s, boost::asio::ssl::context* context) : socket(std::move(s))
+    Parts(Socket s, std::string p, boost::asio::ssl::context* context) : socket(std::move(s)), peer(std::move(p))
     {
       if (context != nullptr)
         tls.emplace(socket, *context);
     }
     Socket socket;
+    std::string peer;
     std::optional<boost::asio::ssl::stream<Socket&>> tls; // refers to the socket, hence stays where it is
     std::string dropped;
   };

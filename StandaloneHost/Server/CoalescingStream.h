@@ -1,6 +1,7 @@
 #pragma once
 
 #include "StandaloneHost/Server/ClientStream.h"
+#include "StandaloneHost/Server/OutgoingBytes.h"
 
 #include <boost/asio/post.hpp>
 #include <boost/asio/write.hpp>
@@ -8,6 +9,7 @@
 #include <boost/beast/core/role.hpp>
 #include <boost/beast/websocket/teardown.hpp>
 
+#include <algorithm>
 #include <chrono>
 #include <cstddef>
 #include <cstdint>
@@ -34,7 +36,10 @@ public:
   using next_layer_type = ClientStream;
   using error_code = boost::system::error_code;
 
-  explicit CoalescingStream(ClientStream client) : m_state(std::make_shared<State>(std::move(client))) {}
+  CoalescingStream(ClientStream client, std::shared_ptr<OutgoingBytes> outgoing)
+      : m_state(std::make_shared<State>(std::move(client), std::move(outgoing)))
+  {
+  }
   CoalescingStream(CoalescingStream&&) = default;
   CoalescingStream& operator=(CoalescingStream&&) = default;
 
@@ -74,17 +79,36 @@ public:
   /// writing for each message would cost as much as parsing and carrying it out.
   void GatherText(std::string_view text)
   {
-    m_state->AppendTextFrame(text);
-    if (m_state->inputDrained)
-      FlushSoon();
-    else if (m_state->gathered.size() >= sendAt)
-      Flush();
+    m_state->AppendTextHead(text.size());
+    m_state->Append(text);
+    OnGathered();
+  }
+
+  /// The same in pieces, so that no more of a long message is copied than there is room for: begins one of that length.
+  void BeginText(std::size_t size)
+  {
+    m_state->AppendTextHead(size);
+    m_state->missing = size;
+  }
+
+  /// How much of the message that has begun is still to come. Until then, frames of the WebSocket's own wait.
+  [[nodiscard]] std::size_t Missing() const { return m_state->missing; }
+
+  /// Takes what there is room for of the next piece, all of it once nothing can be sent any more; returns how much.
+  std::size_t GatherPiece(std::string_view piece)
+  {
+    const std::string_view taken = piece.substr(0, HasRoom() ? sendAt : 0);
+    m_state->Append(taken);
+    m_state->missing -= std::min(taken.size(), m_state->missing);
+    OnGathered();
+    return taken.size();
   }
 
   /// Asks the client for a sign of life.
   void GatherPing()
   {
-    m_state->gathered += std::string_view("\x89\0", 2);
+    if (Missing() == 0) // otherwise the client reads, or shows in the end that it does not
+      m_state->Append(std::string_view("\x89\0", 2));
     FlushSoon();
   }
 
@@ -128,7 +152,21 @@ public:
   /// When the end of the stream has taken too long; far away until it begins.
   [[nodiscard]] std::chrono::steady_clock::time_point TeardownDeadline() const { return m_state->teardownDeadline; }
 
+  void ExtendTeardown(std::chrono::steady_clock::duration pause)
+  {
+    if (TeardownDeadline() != std::chrono::steady_clock::time_point::max())
+      m_state->teardownDeadline += pause;
+  }
+
 private:
+  void OnGathered()
+  {
+    if (m_state->inputDrained)
+      FlushSoon();
+    else if (m_state->gathered.size() >= sendAt)
+      Flush();
+  }
+
   static constexpr std::size_t sendAt = std::size_t{64} << 10;
   static constexpr std::size_t keptBytes = std::size_t{16} << 10; // what more took is given back
   static constexpr int mostPostponed = 16;
@@ -137,7 +175,10 @@ private:
 
   struct State : std::enable_shared_from_this<State>
   {
-    explicit State(ClientStream stream) : client(std::move(stream)) {}
+    State(ClientStream stream, std::shared_ptr<OutgoingBytes> outgoing)
+        : client(std::move(stream)), held(std::move(outgoing))
+    {
+    }
 
     [[nodiscard]] bool HasRoom() const { return gathered.size() <= waitAt; }
 
@@ -145,7 +186,7 @@ private:
     template <class Buffers, class Completion>
     void Gather(const Buffers& buffers, Completion completion)
     {
-      if (!HasRoom() && !error)
+      if ((!HasRoom() || missing != 0) && !error)
       {
         // The buffers stay valid until the completion is called.
         auto waiting = std::make_shared<Completion>(std::move(completion));
@@ -153,41 +194,50 @@ private:
         Flush(shared_from_this());
         return;
       }
-      const std::size_t size = error ? 0 : Append(buffers);
+      const std::size_t size = error ? 0 : AppendControl(buffers);
       if (inputDrained || gathered.size() >= sendAt)
         FlushSoon(shared_from_this());
       boost::asio::post(client.get_executor(), boost::beast::bind_front_handler(std::move(completion), error, size));
     }
 
-    void AppendTextFrame(std::string_view text)
+    void Append(std::string_view bytes)
+    {
+      if (error)
+        return;
+      gathered += bytes;
+      held.Add(bytes.size());
+    }
+
+    void AppendTextHead(std::uint64_t size)
     {
       constexpr char finalText = '\x81';
-      const std::uint64_t size = text.size();
-      gathered += finalText;
+      std::string head{finalText};
       int sizeBytes = 0;
       if (size < 126)
-        gathered += static_cast<char>(size);
+        head += static_cast<char>(size);
       else
       {
         sizeBytes = size <= 0xFFFF ? 2 : 8;
-        gathered += static_cast<char>(sizeBytes == 2 ? 126 : 127);
+        head += static_cast<char>(sizeBytes == 2 ? 126 : 127);
       }
       for (int shift = 8 * (sizeBytes - 1); shift >= 0; shift -= 8)
-        gathered += static_cast<char>(size >> shift & 0xFF);
-      gathered += text;
+        head += static_cast<char>(size >> shift & 0xFF);
+      Append(head);
     }
 
+    /// What the WebSocket itself writes, such as a pong. Beast sends a client its close code back, also one that cannot
+    /// be: then the client has broken the protocol, and is told so.
     template <class Buffers>
-    std::size_t Append(const Buffers& buffers)
+    std::size_t AppendControl(const Buffers& buffers)
     {
-      const std::size_t before = gathered.size();
-      const auto end = boost::asio::buffer_sequence_end(buffers);
-      for (auto it = boost::asio::buffer_sequence_begin(buffers); it != end; ++it)
-      {
-        const boost::asio::const_buffer part = *it;
-        gathered.append(static_cast<const char*>(part.data()), part.size());
-      }
-      return gathered.size() - before;
+      constexpr unsigned firstUnknownCode = 5000;
+      std::string frame(boost::asio::buffer_size(buffers), '\0');
+      const std::size_t size = boost::asio::buffer_copy(boost::asio::buffer(frame), buffers);
+      const auto byte = [&frame](std::size_t i) { return unsigned{static_cast<unsigned char>(frame[i])}; };
+      if (size >= 4 && byte(0) == 0x88 && byte(2) * 256 + byte(3) >= firstUnknownCode)
+        frame.assign("\x88\x02\x03\xEA", 4); // 1002
+      Append(frame);
+      return size;
     }
 
     static void FlushSoon(const std::shared_ptr<State>& state)
@@ -230,29 +280,41 @@ private:
     {
       state->sending = false;
       state->signOfLife = state->signOfLife || state->sent.size() >= sendAt;
+      state->held.Remove(state->sent.size());
       state->sent.clear();
       if (state->sent.capacity() > keptBytes)
         std::string().swap(state->sent);
       if (failed)
       {
         state->error = failed;
+        state->missing = 0;
+        state->held.Remove(state->gathered.size());
         state->gathered.clear();
       }
       // What has gathered meanwhile keeps gathering unless somebody wants it sent.
       if (state->flushAgain || state->gathered.size() >= sendAt)
         Flush(state);
-      for (auto* waiting : {&state->whenRoomForControl, &state->whenRoom})
-        if (state->HasRoom())
-          if (const auto task = std::exchange(*waiting, nullptr))
-            task();
+      // The message that has begun goes on before anything else may stand behind it.
+      RunWhenRoom(*state, state->whenRoom);
+      if (state->missing == 0)
+        RunWhenRoom(*state, state->whenRoomForControl);
       if (!state->sending && state->gathered.empty())
         if (const auto task = std::exchange(state->whenDrained, nullptr))
           task();
     }
 
+    static void RunWhenRoom(State& state, std::function<void()>& waiting)
+    {
+      if (state.HasRoom())
+        if (const auto task = std::exchange(waiting, nullptr))
+          task();
+    }
+
     ClientStream client;
+    HeldBytes held; // both of the following
     std::string gathered;
     std::string sent;
+    std::size_t missing = 0; // of the message that has begun
     bool sending = false;
     bool flushAgain = false;  // Flush was called while sending
     bool flushPosted = false; // FlushSoon has been called

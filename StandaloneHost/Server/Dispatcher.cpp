@@ -2,7 +2,7 @@
 
 #include "StandaloneHost/Server/DescriptionParts.h"
 #include "StandaloneHost/Server/Greeting.h"
-#include "StandaloneHost/Server/JsonText.h"
+#include "StandaloneHost/Server/Responses.h"
 
 #include <algorithm>
 #include <utility>
@@ -15,75 +15,6 @@ using NMX::IResult;
 
 namespace
 {
-
-void AppendHead(std::string& json, std::string_view id)
-{
-  json += "{\"jsonrpc\":\"2.0\",\"id\":";
-  json += id;
-}
-
-std::string RpcErrorText(std::string_view id, int code, std::string_view message)
-{
-  std::string json;
-  AppendHead(json, id);
-  json += ",\"error\":{\"code\":";
-  AppendNumber(json, std::int64_t{code});
-  json += ",\"message\":";
-  AppendString(json, message);
-  json += "}}";
-  return json;
-}
-
-void AppendCodeAndName(std::string& json, IResult result)
-{
-  json += "{\"code\":";
-  AppendNumber(json, std::uint64_t{result.Code()});
-  json += ",\"name\":";
-  AppendString(json, result.Name());
-}
-
-std::string FailureText(std::string_view id, IResult result, std::string_view meaning, std::string_view detail)
-{
-  std::string json;
-  json.reserve(192 + meaning.size() + detail.size());
-  AppendHead(json, id);
-  json += ",\"error\":{\"code\":";
-  AppendNumber(json, std::int64_t{static_cast<std::int32_t>(result.Code())});
-  json += ",\"message\":";
-  AppendString(json, result.Name());
-  json += ",\"data\":{\"code\":";
-  AppendNumber(json, std::uint64_t{result.Code()});
-  json += ",\"text\":";
-  AppendString(json, meaning);
-  if (!detail.empty())
-  {
-    json += ",\"detail\":";
-    AppendString(json, detail);
-  }
-  json += "}}}";
-  return json;
-}
-
-std::string ReplyText(std::string_view id, const FunctionEntry& entry, const NMX::IServerReply& reply)
-{
-  const IResult result = reply.Result();
-  if (result.Failed())
-    return FailureText(id, result, entry.Meaning(result), reply.Text());
-
-  std::string json;
-  json.reserve(128);
-  AppendHead(json, id);
-  json += ",\"result\":";
-  AppendCodeAndName(json, result);
-  json += ",\"outputs\":{";
-  MemberWriter writer(json, entry.outputs);
-  reply.WriteOutputs(writer);
-  json += '}';
-  if (const auto returned = reply.Returned())
-    json += *returned ? ",\"returned\":true" : ",\"returned\":false";
-  json += "}}";
-  return json;
-}
 
 /// The values of by-name params in the order of `names`, as an array; or what is wrong with them.
 std::optional<Complaint> OrderByName(std::string_view object, std::span<const std::string_view> names,
@@ -114,33 +45,72 @@ std::optional<Complaint> OrderByName(std::string_view object, std::span<const st
   return std::nullopt;
 }
 
-/// Gathers the answers to the calls of a batch.
-struct Batch
-{
-  std::string text = "[";
-  std::size_t open;
-  std::size_t calls;
-  Answer answer;
+}
 
-  void Take(const std::string& part)
+/// Gathers the responses to the calls of a batch.
+struct Dispatcher::Batch
+{
+  Batch(std::shared_ptr<OutgoingBytes> outgoing, std::size_t count, Answer whole)
+      : held(std::move(outgoing)), open(count), calls(count), answer(std::move(whole))
   {
-    if (!part.empty())
+  }
+
+  /// Takes a response in. One that is too long is replaced, and calls that have not begun are not carried out from then
+  /// on. What is no success is short.
+  void Take(std::string_view id, ResponseText part, IResult result)
+  {
+    if (result.Succeeded() && !Fits(part))
     {
-      if (text.size() > 1)
-        text += ',';
-      text += part;
+      full = true;
+      part = TooLongText(id, result);
+    }
+    if (!part.Empty())
+    {
+      if (text.Size() > 1)
+        text.Append(",");
+      text.Append(std::move(part));
+      held.Set(text.OwnBytes());
     }
     if (--open == 0)
-      answer(text.size() > 1 ? text + ']' : std::string{}, calls);
+      Finish();
   }
+
+  [[nodiscard]] bool Fits(const ResponseText& part) const
+  {
+    return text.Size() + part.Size() <= held.Longest() && held.MayAdd(part.OwnBytes());
+  }
+
+  void Finish()
+  {
+    if (text.Size() > 1)
+      text.Append("]");
+    else
+      text = {};
+    held.Set(0); // whoever sends it counts it
+    answer(std::move(text), calls);
+  }
+
+  HeldBytes held;
+  ResponseText text{"["};
+  std::size_t open;
+  std::size_t calls;
+  bool full = false;
+  Answer answer;
 };
 
+void Dispatcher::Recipient::Take(std::string_view id, ResponseText text, IResult result) const
+{
+  if (batch)
+    return batch->Take(id, std::move(text), result);
+  if (result.Succeeded() && !(text.Size() <= outgoing->Longest() && outgoing->MayAdd(0, text.OwnBytes())))
+    text = TooLongText(id, result);
+  answer(std::move(text), 1);
 }
 
 Dispatcher::Dispatcher(const Registry& registry, Notifier& notifier, const Limits& limits,
-                       TerminalServer2::Level grantedLevel, std::string epoch)
-    : m_registry(registry), m_notifier(notifier), m_limits(limits), m_grantedLevel(grantedLevel),
-      m_epoch(std::move(epoch))
+                       std::shared_ptr<OutgoingBytes> outgoing, TerminalServer2::Level grantedLevel, std::string epoch)
+    : m_registry(registry), m_notifier(notifier), m_limits(limits), m_outgoing(std::move(outgoing)),
+      m_grantedLevel(grantedLevel), m_epoch(std::move(epoch))
 {
 }
 
@@ -168,66 +138,74 @@ std::size_t Dispatcher::Handle(std::string_view text, IListener* listener, Answe
   m_calls.store(Calls() + calls, std::memory_order_relaxed); // nobody else writes it
   if (!message.batch)
   {
-    HandleRequest(message.requests.front(), listener, std::move(answer));
+    HandleRequest(message.requests.front(), listener, {std::move(answer), nullptr, m_outgoing.get()});
     return 1;
   }
-  const auto batch = std::make_shared<Batch>();
-  batch->open = calls;
-  batch->calls = calls;
-  batch->answer = std::move(answer);
+  const auto batch = std::make_shared<Batch>(m_outgoing, calls, std::move(answer));
   for (const Request& request : message.requests)
-    HandleRequest(request, listener, [batch](const std::string& part, std::size_t) { batch->Take(part); });
+  {
+    if (batch->full && !request.complaint)
+      batch->Take(request.id, request.id.empty() ? ResponseText{} : NotBegunText(request.id), EResult::Failed);
+    else
+      HandleRequest(request, listener, {nullptr, batch, m_outgoing.get()});
+  }
   return calls;
 }
 
-void Dispatcher::HandleRequest(const Request& request, IListener* listener, Answer answer)
+void Dispatcher::HandleRequest(const Request& request, IListener* listener, Recipient recipient)
 {
-  const bool notification = request.id.empty();
-  const auto answerNow = [&](std::string text) { answer(notification ? std::string{} : std::move(text), 1); };
+  const auto refuse = [&](std::string text)
+  { recipient.Take(request.id, request.id.empty() ? ResponseText{} : std::move(text), EResult::Failed); };
 
   if (request.complaint)
-    answer(RpcErrorText(request.id, request.complaint->code, request.complaint->text), 1);
+    refuse(RpcErrorText(request.id, request.complaint->code, request.complaint->text));
   else if (const FunctionEntry* entry = m_registry.FindFunction(request.method))
   {
     if (entry->level < m_grantedLevel)
-      answerNow(FailureText(request.id, EResult::NotPermitted, entry->Meaning(EResult::NotPermitted),
-                            "a preview function; the host opens these with --level 1"));
+      refuse(FailureText(request.id, EResult::NotPermitted, entry->Meaning(EResult::NotPermitted),
+                         "a preview function; the host opens these with --level 1"));
     else
-      Call(*entry, request, std::move(answer));
+      Call(*entry, request, std::move(recipient));
   }
   else
-    answerNow(CallServer(request, listener));
+    CallServer(request, listener, recipient);
 }
 
-void Dispatcher::Call(const FunctionEntry& entry, const Request& request, Answer answer)
+void Dispatcher::Call(const FunctionEntry& entry, const Request& request, Recipient recipient)
 {
   std::string ordered;
   std::string_view arguments = request.params;
   if (arguments.front() == '{')
   {
     if (const auto complaint = OrderByName(arguments, entry.inputs, m_limits, ordered))
-    {
-      answer(request.id.empty() ? std::string{} : RpcErrorText(request.id, complaint->code, complaint->text), 1);
-      return;
-    }
+      return recipient.Take(
+          request.id,
+          request.id.empty() ? std::string{} : RpcErrorText(request.id, complaint->code, complaint->text),
+          EResult::Failed);
     arguments = ordered;
   }
   // The entry stays until every call has been finished.
-  entry.function->Invoke(
-      arguments, [id = std::string(request.id), &entry, answer = std::move(answer)](const NMX::IServerReply& finished)
-      { answer(id.empty() ? std::string{} : ReplyText(id, entry, finished), 1); });
+  entry.function->Invoke(arguments,
+                         [id = std::string(request.id), &entry,
+                          recipient = std::move(recipient)](const NMX::IServerReply& finished)
+                         {
+                           recipient.Take(id, id.empty() ? std::string{} : ReplyText(id, entry, finished),
+                                          finished.Result());
+                         });
 }
 
-std::string Dispatcher::CallServer(const Request& request, IListener* listener)
+void Dispatcher::CallServer(const Request& request, IListener* listener, const Recipient& recipient)
 {
-  const bool describe = request.method == "rpc.discover";
-  if (describe)
-  {
-    std::string json;
-    AppendHead(json, request.id);
-    json += ",\"result\":" + Api().functions + '}';
-    return json;
-  }
+  ResponseText text;
+  if (request.method == "rpc.discover")
+    text = SharedResultText(request.id, Api().functions);
+  else
+    text = Subscribe(request, listener);
+  recipient.Take(request.id, request.id.empty() ? ResponseText{} : std::move(text), EResult::Ok);
+}
+
+std::string Dispatcher::Subscribe(const Request& request, IListener* listener)
+{
   for (const SubscriptionText& text : SubscriptionTexts())
     if (request.method == text.method)
       return Subscription(text, request, listener);
@@ -256,16 +234,7 @@ std::string Dispatcher::Subscription(const SubscriptionText& text, const Request
     return FailureText(request.id, result, failure == text.failures.end() ? std::string_view{} : failure->text, {});
   }
 
-  std::string json;
-  AppendHead(json, request.id);
-  json += ",\"result\":";
-  AppendCodeAndName(json, result);
-  json += ",\"outputs\":{},\"epoch\":";
-  AppendString(json, m_epoch);
-  json += ",\"sequence\":";
-  AppendNumber(json, m_notifier.Sequence());
-  json += "}}";
-  return json;
+  return SubscribedText(request.id, result, m_epoch, m_notifier.Sequence());
 }
 
 }

@@ -3,7 +3,9 @@
 #include "StandaloneHost/Server/ApiDocuments.h"
 #include "StandaloneHost/Server/Envelope.h"
 #include "StandaloneHost/Server/Notifier.h"
+#include "StandaloneHost/Server/OutgoingBytes.h"
 #include "StandaloneHost/Server/Registry.h"
+#include "StandaloneHost/Server/ResponseText.h"
 
 #include <atomic>
 #include <cstdint>
@@ -18,15 +20,15 @@ namespace Server
 struct SubscriptionText;
 
 /// Receives the answer to one message, an empty text when there is none to give, and how many calls it was for.
-using Answer = std::function<void(std::string text, std::size_t calls)>;
+using Answer = std::function<void(ResponseText text, std::size_t calls)>;
 
 /// Carries out the messages of clients: finds the function of each call, puts its arguments in order, and words the
 /// answers. [server]
 class Dispatcher
 {
 public:
-  Dispatcher(const Registry& registry, Notifier& notifier, const Limits& limits, TerminalServer2::Level grantedLevel,
-             std::string epoch);
+  Dispatcher(const Registry& registry, Notifier& notifier, const Limits& limits,
+             std::shared_ptr<OutgoingBytes> outgoing, TerminalServer2::Level grantedLevel, std::string epoch);
 
   /// Carries out one message. `answer` is called exactly once, perhaps before this returns. `listener` is the client
   /// as one that can be told of changes; null when its transport cannot. Returns how many calls were begun.
@@ -42,14 +44,29 @@ public:
   [[nodiscard]] const ApiDocuments& Api() const;
 
 private:
-  void HandleRequest(const Request& request, IListener* listener, Answer answer);
-  void Call(const FunctionEntry& entry, const Request& request, Answer answer);
-  [[nodiscard]] std::string CallServer(const Request& request, IListener* listener);
+  struct Batch;
+
+  /// Where the response to one request goes: to whoever sent it, or to the batch that it is part of.
+  struct Recipient
+  {
+    /// `result` tells what an answer that is too long came to. An empty text stands for no response.
+    void Take(std::string_view id, ResponseText text, NMX::IResult result) const;
+
+    Answer answer;
+    std::shared_ptr<Batch> batch; ///< null for a request on its own
+    const OutgoingBytes* outgoing;
+  };
+
+  void HandleRequest(const Request& request, IListener* listener, Recipient recipient);
+  void Call(const FunctionEntry& entry, const Request& request, Recipient recipient);
+  void CallServer(const Request& request, IListener* listener, const Recipient& recipient);
+  [[nodiscard]] std::string Subscribe(const Request& request, IListener* listener);
   [[nodiscard]] std::string Subscription(const SubscriptionText& text, const Request& request, IListener* listener);
 
   const Registry& m_registry;
   Notifier& m_notifier;
   const Limits& m_limits;
+  const std::shared_ptr<OutgoingBytes> m_outgoing;
   const TerminalServer2::Level m_grantedLevel;
   const std::string m_epoch;
   mutable ApiDocuments m_api; // made when first asked for

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <memory>
 #include <string>
 #include <string_view>
 #include <vector>
@@ -12,7 +13,7 @@ struct Document
 {
   std::string_view target; ///< such as "/openrpc.json"
   std::string_view type;   ///< as in the header Content-Type
-  std::string text;
+  std::shared_ptr<const std::string> text;
   bool open = false; ///< read without a token: it holds nothing but what everybody has who has the program
 };
 

@@ -18,6 +18,7 @@ inline constexpr int parse = -32700;
 inline constexpr int invalidRequest = -32600;
 inline constexpr int methodNotFound = -32601;
 inline constexpr int invalidParams = -32602;
+inline constexpr int tooLong = -32000; ///< of the server's own: what is to be answered is too long
 }
 
 /// What is wrong with a message or one of its requests.

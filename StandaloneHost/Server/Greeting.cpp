@@ -15,37 +15,6 @@ namespace json = boost::json;
 namespace
 {
 
-template <auto limit>
-std::uint64_t Value(const Limits& limits)
-{
-  return limits.*limit;
-}
-
-struct LimitText
-{
-  std::string_view name;
-  std::uint64_t (*value)(const Limits& limits);
-  std::string_view description;
-};
-
-constexpr LimitText limitTexts[] = {
-    {"messageBytes", Value<&Limits::messageBytes>, "Length of a message, in bytes."},
-    {"nesting", Value<&Limits::nesting>, "Depth of arrays and objects in a message."},
-    {"batchCalls", Value<&Limits::batchCalls>, "Calls in a batch."},
-    {"connections", Value<&Limits::connections>, "Connections of all clients together."},
-    {"webSockets", Value<&Limits::webSockets>, "WebSockets among the connections."},
-    {"subscriptions", Value<&Limits::subscriptions>, "Callbacks that a connection subscribes to."},
-    {"callsInFlight", Value<&Limits::callsInFlight>, "Calls of a connection at the same time; more wait."},
-    {"callsInFlightOverall", Value<&Limits::callsInFlightOverall>,
-     "Calls of all connections at the same time; more wait."},
-    {"outgoingBytes", Value<&Limits::outgoingBytes>, "Bytes that wait for the client to read them."},
-    {"outgoingBytesOverall", Value<&Limits::outgoingBytesOverall>,
-     "Bytes that wait for all clients together; beyond, each has its share only."},
-    {"outgoingNotifications", Value<&Limits::outgoingNotifications>,
-     "Notifications that wait for the client to read them and may not stand for each other."},
-    {"pingAfterSeconds", [](const Limits& limits) { return static_cast<std::uint64_t>(limits.pingAfter.count()); },
-     "Silence after which the client is pinged; as long again, and the connection is ended."}};
-
 struct LevelText
 {
   std::string_view name;
@@ -70,12 +39,12 @@ std::string GreetingText(const Greeting& greeting)
   AppendString(text, greeting.api);
   text += ",\"limits\":";
   char separator = '{';
-  for (const LimitText& limit : limitTexts)
+  for (const LimitRow& limit : LimitRows())
   {
     text += std::exchange(separator, ',');
     AppendString(text, limit.name);
     text += ':';
-    AppendNumber(text, limit.value(greeting.limits));
+    AppendNumber(text, std::uint64_t{greeting.limits.*limit.member});
   }
   text += "},\"levels\":{\"open\":2,\"preview\":1,\"granted\":";
   AppendNumber(text, std::uint64_t{greeting.grantedLevel});
@@ -90,7 +59,7 @@ json::object GreetingMembers()
                                                 "another text when the API is another one.");
   api["pattern"] = "^[0-9a-f]{64}$";
   json::object limits;
-  for (const LimitText& limit : limitTexts)
+  for (const LimitRow& limit : LimitRows())
     limits[limit.name] = CountSchema(title + ".Limits." + std::string(limit.name), limit.description);
   json::object levels;
   for (const LevelText& level : levelTexts)

@@ -3,6 +3,7 @@
 #include "HostInterface/NMX/GlobalLog.h"
 #include "StandaloneHost/Server/Admission.h"
 #include "StandaloneHost/Server/HttpHead.h"
+#include "StandaloneHost/Server/RequestHead.h"
 #include "StandaloneHost/Server/WebSocketSession.h"
 
 #include <boost/asio/write.hpp>
@@ -12,9 +13,10 @@
 
 #include <openssl/sslerr.h>
 
-#include <array>
+#include <algorithm>
 #include <optional>
 #include <utility>
+#include <vector>
 
 namespace Server
 {
@@ -27,6 +29,10 @@ namespace
 {
 
 constexpr std::size_t headerBytes = 16384;
+constexpr std::size_t bodyBufferBytes = 65536; // for reading a body piece by piece
+constexpr std::size_t chunkBytes = 8192;       // read at once of a body whose length is not known
+constexpr std::size_t keptBytes = 4096;        // of the buffer, while the client says nothing
+constexpr std::size_t copiedBytes = 16384;     // a response up to this size is sent in one piece with its head
 constexpr auto handshakeTime = std::chrono::seconds(10);
 constexpr auto idleTime = std::chrono::seconds(60);
 constexpr auto transferTime = std::chrono::seconds(30);
@@ -57,16 +63,11 @@ Refusal RefusalFor(EAdmission admission)
           "This host is reached by its address or as localhost, not by that name.\n"};
 }
 
-std::string_view ToView(boost::beast::string_view text)
-{
-  return {text.data(), text.size()};
-}
-
 class HttpSession final : public IConnection, public std::enable_shared_from_this<HttpSession>
 {
 public:
-  HttpSession(Socket socket, std::shared_ptr<Core> core)
-      : m_core(std::move(core)), m_stream(std::move(socket), m_core->tls.get())
+  HttpSession(Socket socket, std::string peer, std::shared_ptr<Core> core)
+      : m_core(std::move(core)), m_stream(std::move(socket), std::move(peer), m_core->tls.get())
   {
     m_core->connections.Add(*this);
   }
@@ -107,7 +108,20 @@ public:
     Abort();
   }
 
+  void Extend(Clock::duration pause) override
+  {
+    if (m_deadline != Clock::time_point::max())
+      m_deadline += pause;
+  }
+
   [[nodiscard]] std::optional<Clock::time_point> WaitsSince() const override { return m_waitsSince; }
+
+  [[nodiscard]] std::optional<Clock::time_point> StrangerSince() const override
+  {
+    return m_known ? std::nullopt : std::optional(m_began);
+  }
+
+  [[nodiscard]] std::string Peer() const override { return m_stream.Peer(); }
 
   [[nodiscard]] std::weak_ptr<IConnection> Weak() override { return weak_from_this(); }
 
@@ -138,9 +152,14 @@ private:
   void Read()
   {
     m_busy = false;
+    m_head = {};
+    m_origin.clear();
     m_parser.emplace();
     m_parser->header_limit(headerBytes);
     m_parser->body_limit(m_core->options.limits.messageBytes);
+    m_buffer.max_size(std::max(headerBytes, m_buffer.size()));
+    if (m_buffer.size() == 0 && m_buffer.capacity() > keptBytes)
+      m_buffer.shrink_to_fit();
     AwaitClient(idleTime);
     http::async_read_header(m_stream, m_buffer, *m_parser,
                             [self = shared_from_this()](error_code error, std::size_t) { self->OnHeader(error); });
@@ -156,42 +175,63 @@ private:
     const auto& request = m_parser->get();
     m_keepAlive = request.keep_alive() && !m_core->closing;
     m_oldVersion = request.version() < 11;
-    m_origin = request[http::field::origin];
+    if (const auto refused = ReadHead(request, m_head))
+      return RefuseHead(*refused);
+    m_origin = m_head.origin;
     if (const EAdmission admission = Admission(); admission != EAdmission::Welcome)
       return Refuse(admission);
     if (boost::beast::websocket::is_upgrade(request))
-    {
-      if (request.target() != "/rpc")
-        return RespondAndClose(http::status::not_found, "WebSockets are served at /rpc.\n");
-      if (m_core->webSockets >= m_core->options.limits.webSockets)
-      {
-        m_core->refusals.Note(ERefusal::TooManyConnections, m_stream.Peer(), "WebSockets");
-        return RespondAndClose(http::status::service_unavailable, "Too many WebSockets.\n");
-      }
-      return StartWebSocket(std::move(m_stream), http::request<http::string_body>(request.base()), m_core);
-    }
-    if (request[http::field::expect] == "100-continue")
+      return Upgrade();
+    if (m_head.hasBody && (m_head.method != http::verb::post || m_head.path != "/rpc"))
+      return RefuseBody();
+    if (m_head.awaitsContinue && m_buffer.size() == 0)
       return SendContinue();
     ReadBody();
   }
 
+  void RefuseHead(const HeadError& refused)
+  {
+    m_core->refusals.Note(ERefusal::BadRequest, m_stream.Peer(), refused.text.substr(0, refused.text.size() - 1));
+    RespondAndClose(refused.status, refused.text);
+  }
+
+  /// Answers what has a body that nobody wants to see. The rest of it is dropped with the connection.
+  void RefuseBody()
+  {
+    m_keepAlive = false;
+    OnRequest();
+  }
+
+  void Upgrade()
+  {
+    if (m_head.path != "/rpc")
+      return RespondAndClose(http::status::not_found, "WebSockets are served at /rpc.\n");
+    // What stands between could take it for another request.
+    if (m_buffer.size() != 0)
+      return RefuseHead({http::status::bad_request, "Something follows the upgrade before it is answered.\n"});
+    if (m_core->webSockets >= m_core->options.limits.webSockets)
+    {
+      m_core->refusals.Note(ERefusal::TooManyConnections, m_stream.Peer(), "WebSockets");
+      return RespondAndClose(http::status::service_unavailable, "Too many WebSockets.\n");
+    }
+    StartWebSocket(std::move(m_stream), http::request<http::string_body>(m_parser->get().base()),
+                   OffersProtocol(m_head.webSocketProtocols), m_core);
+  }
+
   [[nodiscard]] EAdmission Admission() const
   {
-    const auto& request = m_parser->get();
-    const Document* document = m_core->documents.Find(ToView(request.target()));
-    const bool open = request.method() == http::verb::options ||
-                      (request.method() == http::verb::get && document != nullptr && document->open);
-    return Admit({ToView(request[http::field::host]), m_origin, ToView(request[http::field::authorization]),
-                  ToView(request[http::field::sec_websocket_protocol]), open},
-                 m_core->options);
+    const Document* document = m_core->documents.Find(m_head.path);
+    const bool open =
+        m_head.method == http::verb::options ||
+        ((m_head.method == http::verb::get || m_head.method == http::verb::head) && document != nullptr && document->open);
+    return Admit({m_head.host, m_origin, m_head.authorisation, m_head.webSocketProtocols, open}, m_core->options);
   }
 
   void Refuse(EAdmission admission)
   {
     const Refusal refusal = RefusalFor(admission);
-    const auto& request = m_parser->get();
-    const auto detail = refusal.kind == ERefusal::WrongOrigin ? ToView(m_origin)
-                        : refusal.kind == ERefusal::WrongHost ? ToView(request[http::field::host])
+    const auto detail = refusal.kind == ERefusal::WrongOrigin ? std::string_view(m_origin)
+                        : refusal.kind == ERefusal::WrongHost ? m_head.host
                                                               : std::string_view{};
     m_core->refusals.Note(refusal.kind, m_stream.Peer(), detail);
     m_origin.clear();
@@ -209,24 +249,36 @@ private:
                              });
   }
 
+  /// Takes in what has come of the body, nearly always all of it with the header, and reads on if something is missing.
   void ReadBody()
   {
-    // Nearly always the body has come with the header: then it needs no operation of its own.
+    // The end of a body in chunks has five bytes. With fewer, Beast's parser takes its first three for granted twice.
+    const std::size_t least = m_parser->chunked() ? 5 : 1;
     error_code failed;
-    while (!failed && !m_parser->is_done() && m_buffer.size() != 0)
-      m_buffer.consume(m_parser->put(m_buffer.data(), failed));
+    while ((!failed || failed == http::error::need_more) && !m_parser->is_done() && m_buffer.size() >= least)
+    {
+      const std::size_t taken = m_parser->put(m_buffer.data(), failed);
+      m_buffer.consume(taken);
+      if (taken == 0)
+        break;
+    }
     if (failed && failed != http::error::need_more)
       return OnBadRequest(failed);
     if (m_parser->is_done())
       return OnRequest();
-    http::async_read(m_stream, m_buffer, *m_parser,
-                     [self = shared_from_this()](error_code error, std::size_t)
-                     {
-                       if (error)
-                         self->OnBadRequest(error);
-                       else
-                         self->OnRequest();
-                     });
+    m_buffer.max_size(bodyBufferBytes);
+    if (m_buffer.size() >= bodyBufferBytes)
+      return OnBadRequest(http::error::buffer_overflow);
+    const auto missing = m_parser->content_length_remaining().value_or(chunkBytes);
+    const std::size_t room = bodyBufferBytes - m_buffer.size();
+    m_stream.async_read_some(m_buffer.prepare(static_cast<std::size_t>(std::min<std::uint64_t>(room, missing))),
+                             [self = shared_from_this()](error_code error, std::size_t size)
+                             {
+                               if (error)
+                                 return self->Abort(); // the client has gone
+                               self->m_buffer.commit(size);
+                               self->ReadBody();
+                             });
   }
 
   void OnBadRequest(error_code error)
@@ -239,8 +291,10 @@ private:
     if (error == http::error::body_limit)
       refuse(http::status::payload_too_large,
              "The message is longer than " + std::to_string(m_core->options.limits.messageBytes) + " bytes.\n");
-    else if (error == http::error::header_limit)
+    else if (error == http::error::header_limit || (error == http::error::buffer_overflow && !m_parser->is_header_done()))
       refuse(http::status::request_header_fields_too_large, "The header is too long.\n");
+    else if (error == http::error::buffer_overflow)
+      refuse(http::status::bad_request, "What stands around the chunks of the body is too long.\n");
     else if (error == http::error::end_of_stream || error == http::error::partial_message ||
              error.category() != make_error_code(http::error::end_of_stream).category())
       Abort(); // the client has gone
@@ -252,46 +306,51 @@ private:
   {
     m_waitsSince.reset();
     m_deadline = Clock::time_point::max();
-    const auto& request = m_parser->get();
-    const std::string_view target = ToView(request.target());
-    const http::verb method = request.method();
-    if (method == http::verb::options)
+    if (m_head.method == http::verb::options)
       return Respond(http::status::no_content, {}, {});
-    if (target == "/rpc")
+    if (m_head.path == "/rpc")
     {
-      if (method == http::verb::post)
+      if (m_head.method == http::verb::post)
         return Call();
       return RespondWithAllow("POST, OPTIONS", "Calls are posted; a GET needs a WebSocket upgrade.\n");
     }
-    const Document* document = m_core->documents.Find(target);
+    const Document* document = m_core->documents.Find(m_head.path);
     if (document == nullptr)
       return Respond(http::status::not_found, "text/plain; charset=utf-8", "There is nothing here.\n");
-    if (method != http::verb::get)
-      return RespondWithAllow("GET, OPTIONS", "This can only be read.\n");
+    if (m_head.method != http::verb::get && m_head.method != http::verb::head)
+      return RespondWithAllow("GET, HEAD, OPTIONS", "This can only be read.\n");
+    m_known = m_known || (!document->open && !m_core->options.token.empty());
     // The document outlives the answer: many who read it slowly take no memory for it.
-    m_reply = HeadText(Head(http::status::ok, document->type, {}), document->text.size(), 0);
-    Send(boost::asio::buffer(document->text));
+    Send(Head(http::status::ok, document->type, {}), *document->text);
   }
 
   void Call()
   {
+    m_known = true;
     try
     {
       // No notifications without a WebSocket. The body stays until the next request is read.
       m_core->dispatcher.Handle(m_parser->get().body(), nullptr,
-                                [self = shared_from_this()](std::string answer, std::size_t)
-                                {
-                                  if (answer.empty())
-                                    self->Respond(http::status::no_content, {}, {});
-                                  else
-                                    self->Respond(http::status::ok, "application/json", answer);
-                                });
+                                [self = shared_from_this()](ResponseText answer, std::size_t)
+                                { self->OnAnswer(std::move(answer)); });
     }
     catch (const std::exception& failure)
     {
       NMX::Log(NMX::serverLog, NMX::ESeverity::Error, "A message could not be handled: %1%", failure.what());
       RespondAndClose(http::status::internal_server_error, "The message could not be handled.\n");
     }
+  }
+
+  void OnAnswer(ResponseText answer)
+  {
+    if (answer.Empty())
+      return Respond(http::status::no_content, {}, {});
+    const HttpHead head = Head(http::status::ok, "application/json", {});
+    if (answer.IsPlain() && answer.Size() <= copiedBytes)
+      return Send(head, answer.Own());
+    m_body = std::move(answer);
+    m_reply = HeadText(head, m_body.Size(), 0);
+    SendPieces(m_body.PiecesFrom(0));
   }
 
   void RespondWithAllow(std::string_view methods, std::string_view text)
@@ -305,9 +364,7 @@ private:
   {
     if (status == http::status::unauthorized)
       fields = "WWW-Authenticate: Bearer\r\n";
-    m_reply = HeadText(Head(status, type, fields), body.size(), body.size());
-    m_reply += body;
-    Send({});
+    Send(Head(status, type, fields), body);
   }
 
   [[nodiscard]] HttpHead Head(http::status status, std::string_view type, std::string_view fields)
@@ -316,16 +373,29 @@ private:
     return {status, fields, type, m_origin, m_keepAlive, m_oldVersion};
   }
 
+  /// Sends a head, and a body of which a copy is sent if it is short; otherwise it stays where it is until then.
+  void Send(const HttpHead& head, std::string_view body)
+  {
+    const bool copied = body.size() <= copiedBytes;
+    const bool told = m_head.method != http::verb::head; // who asks for the head alone is told the length only
+    m_reply = HeadText(head, body.size(), copied && told ? body.size() : 0);
+    if (copied && told)
+      m_reply += body;
+    SendPieces(copied || !told ? std::vector<std::string_view>{} : std::vector{body});
+  }
+
   /// Sends the reply, and after it what stays where it is.
-  void Send(boost::asio::const_buffer rest)
+  void SendPieces(const std::vector<std::string_view>& pieces)
   {
     AwaitClient(transferTime);
+    m_held.Set(m_reply.size() + m_body.OwnBytes());
     const auto sent = [self = shared_from_this()](error_code error, std::size_t) { self->OnSent(error); };
-    if (rest.size() == 0)
-      boost::asio::async_write(m_stream, boost::asio::buffer(m_reply), sent);
-    else
-      boost::asio::async_write(m_stream, std::array{boost::asio::const_buffer(boost::asio::buffer(m_reply)), rest},
-                               sent);
+    if (pieces.empty())
+      return boost::asio::async_write(m_stream, boost::asio::buffer(m_reply), sent);
+    std::vector<boost::asio::const_buffer> buffers{boost::asio::buffer(m_reply)};
+    for (const std::string_view piece : pieces)
+      buffers.emplace_back(piece.data(), piece.size());
+    boost::asio::async_write(m_stream, std::move(buffers), sent);
   }
 
   void OnSent(error_code error)
@@ -333,6 +403,8 @@ private:
     if (error)
       return Abort();
     std::string().swap(m_reply);
+    m_body = {};
+    m_held.Set(0);
     if (m_keepAlive)
       return Read();
     // The rest of what the client sends is read and dropped for a while: to close on it would take back the answer.
@@ -345,25 +417,30 @@ private:
   ClientStream m_stream;
   boost::beast::flat_buffer m_buffer;
   std::optional<http::request_parser<http::string_body>> m_parser;
+  RequestHead m_head; // looks into what the parser has
   std::string m_reply;
+  ResponseText m_body; // what follows the reply
+  HeldBytes m_held{m_core->outgoing};
   std::string m_origin;
+  const Clock::time_point m_began = Clock::now();
   Clock::time_point m_deadline = Clock::time_point::max();
   std::optional<Clock::time_point> m_waitsSince;
   bool m_busy = false;
+  bool m_known = false; // has called, or shown the token
   bool m_keepAlive = true;
   bool m_oldVersion = false; // HTTP/1.0: it is told when the connection is kept
 };
 
 }
 
-void StartHttp(Socket socket, std::shared_ptr<Core> core)
+void StartHttp(Socket socket, std::string peer, std::shared_ptr<Core> core)
 {
-  std::make_shared<HttpSession>(std::move(socket), std::move(core))->Start();
+  std::make_shared<HttpSession>(std::move(socket), std::move(peer), std::move(core))->Start();
 }
 
-void RefuseHttp(Socket socket, std::shared_ptr<Core> core)
+void RefuseHttp(Socket socket, std::string peer, std::shared_ptr<Core> core)
 {
-  const auto session = std::make_shared<HttpSession>(std::move(socket), std::move(core));
+  const auto session = std::make_shared<HttpSession>(std::move(socket), std::move(peer), std::move(core));
   if (!session->Encrypted())
     session->RespondAndClose(http::status::service_unavailable, "Too many connections.\n");
 }

@@ -101,7 +101,7 @@ void Notifier::Deliver(Channel& channel, const NMX::IServerNotification& notific
   AppendNumber(text, ++m_sequence);
   text += "}}";
 
-  const auto message = std::make_shared<const std::string>(std::move(text));
+  const auto message = std::make_shared<const ResponseText>(std::move(text));
   const EPolicy policy = callback.arguments.empty() ? EPolicy::Change : EPolicy::Sequence;
   // A listener that is too slow may leave while it is told.
   const std::vector<IListener*> listeners = channel.listeners;

@@ -6,19 +6,16 @@
 namespace Server
 {
 
-void OutgoingQueue::Count(std::size_t more, std::size_t less)
+void OutgoingQueue::Count(const ResponseText& message)
 {
-  m_bytes += more;
-  m_bytes -= less;
-  m_overall += more;
-  m_overall -= less;
+  m_length += message.Size();
+  m_held.Add(message.OwnBytes());
 }
 
-bool OutgoingQueue::TooMuch(std::size_t size) const
+void OutgoingQueue::Uncount(const ResponseText& message)
 {
-  const std::size_t share = m_limits.outgoingBytesOverall / m_limits.connections;
-  return m_bytes + size > m_limits.outgoingBytes ||
-         (m_overall + size > m_limits.outgoingBytesOverall && m_bytes + size > share);
+  m_length -= message.Size();
+  m_held.Remove(message.OwnBytes());
 }
 
 bool OutgoingQueue::Push(SharedMessage message, EPolicy policy, const void* callback)
@@ -29,37 +26,38 @@ bool OutgoingQueue::Push(SharedMessage message, EPolicy policy, const void* call
                                       { return waiting.policy == EPolicy::Change && waiting.callback == callback; });
     if (earlier != m_waiting.end())
     {
-      Count(message->size(), earlier->message->size());
+      Uncount(*earlier->message);
+      Count(*message);
       earlier->message = std::move(message);
       return true;
     }
   }
-  if (TooMuch(message->size()))
+  if (m_length + message->Size() > m_limits.outgoingBytes || !m_held.MayAdd(message->OwnBytes()))
     return false;
   if (policy == EPolicy::Sequence && m_sequences == m_limits.outgoingNotifications)
     return false;
 
-  Count(message->size(), 0);
+  Count(*message);
   m_changes += policy == EPolicy::Change ? 1 : 0;
   m_sequences += policy == EPolicy::Sequence ? 1 : 0;
   m_waiting.push_back({std::move(message), policy, callback});
   return true;
 }
 
-SharedMessage OutgoingQueue::Pop()
+void OutgoingQueue::Pop()
 {
-  Waiting first = std::move(m_waiting.front());
-  m_waiting.pop_front();
-  Count(0, first.message->size());
+  const Waiting& first = m_waiting.front();
+  Uncount(*first.message);
   m_changes -= first.policy == EPolicy::Change ? 1 : 0;
   m_sequences -= first.policy == EPolicy::Sequence ? 1 : 0;
-  return std::move(first.message);
+  m_waiting.pop_front();
 }
 
 void OutgoingQueue::Clear()
 {
   m_waiting.clear();
-  Count(0, m_bytes);
+  m_held.Set(0);
+  m_length = 0;
   m_changes = 0;
   m_sequences = 0;
 }

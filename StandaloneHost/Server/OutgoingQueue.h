@@ -1,17 +1,18 @@
 #pragma once
 
 #include "StandaloneHost/Server/Limits.h"
+#include "StandaloneHost/Server/OutgoingBytes.h"
+#include "StandaloneHost/Server/ResponseText.h"
 
 #include <cstddef>
 #include <deque>
 #include <memory>
-#include <string>
 
 namespace Server
 {
 
 /// A message on its way to one or many clients.
-using SharedMessage = std::shared_ptr<const std::string>;
+using SharedMessage = std::shared_ptr<const ResponseText>;
 
 /// How a message may be treated while it waits.
 enum class EPolicy
@@ -25,9 +26,10 @@ enum class EPolicy
 class OutgoingQueue
 {
 public:
-  /// `overall` counts the bytes that wait for all clients, and outlives the queue.
-  OutgoingQueue(const Limits& limits, std::size_t& overall) : m_limits(limits), m_overall(overall) {}
-  ~OutgoingQueue() { Clear(); }
+  OutgoingQueue(const Limits& limits, std::shared_ptr<OutgoingBytes> outgoing)
+      : m_limits(limits), m_held(std::move(outgoing))
+  {
+  }
   OutgoingQueue(const OutgoingQueue&) = delete;
   OutgoingQueue& operator=(const OutgoingQueue&) = delete;
 
@@ -35,13 +37,14 @@ public:
   /// the queue is unchanged then. `callback` tells the callbacks apart.
   [[nodiscard]] bool Push(SharedMessage message, EPolicy policy, const void* callback = nullptr);
 
-  /// The next message to send. The queue is not empty.
-  [[nodiscard]] SharedMessage Pop();
+  /// The next message to send, and what takes it out of the queue. The queue is not empty.
+  [[nodiscard]] const SharedMessage& Front() const { return m_waiting.front().message; }
+  void Pop();
 
   void Clear();
 
   [[nodiscard]] bool Empty() const { return m_waiting.empty(); }
-  [[nodiscard]] std::size_t Bytes() const { return m_bytes; }
+  [[nodiscard]] std::size_t Bytes() const { return m_length; }
 
 private:
   struct Waiting
@@ -51,13 +54,13 @@ private:
     const void* callback;
   };
 
-  void Count(std::size_t more, std::size_t less);
-  [[nodiscard]] bool TooMuch(std::size_t size) const;
+  void Count(const ResponseText& message);
+  void Uncount(const ResponseText& message);
 
   const Limits& m_limits;
-  std::size_t& m_overall;
+  HeldBytes m_held; // what is not shared
+  std::size_t m_length = 0;
   std::deque<Waiting> m_waiting;
-  std::size_t m_bytes = 0;
   std::size_t m_changes = 0;
   std::size_t m_sequences = 0;
 };

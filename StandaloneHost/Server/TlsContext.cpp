@@ -47,6 +47,10 @@ std::unique_ptr<ssl::context> MakeTlsContext(const std::filesystem::path& certif
   auto context = std::make_unique<ssl::context>(ssl::context::tls_server);
   context->set_options(ssl::context::default_workarounds | ssl::context::no_tlsv1 | ssl::context::no_tlsv1_1 |
                        ssl::context::no_compression | SSL_OP_NO_RENEGOTIATION | SSL_OP_CIPHER_SERVER_PREFERENCE);
+  // What is recorded today must not be read by whoever gets the key later; there is no list of ciphers for TLS 1.3.
+  if (SSL_CTX_set_cipher_list(context->native_handle(), "ECDHE+AESGCM:ECDHE+CHACHA20") != 1)
+    throw ServerError("TLS offers no cipher that keeps its word when the key is lost");
+  SSL_CTX_set_session_cache_mode(context->native_handle(), SSL_SESS_CACHE_OFF); // strangers would fill it
   // A key with a password would be asked for on the terminal.
   context->set_password_callback([](std::size_t, ssl::context::password_purpose) { return std::string{}; });
   SSL_CTX_set_alpn_select_cb(context->native_handle(), ChooseProtocol, nullptr);

@@ -12,7 +12,9 @@
 #include <boost/asio/post.hpp>
 #include <boost/asio/steady_timer.hpp>
 
+#include <fstream>
 #include <future>
+#include <optional>
 #include <random>
 #include <sys/resource.h>
 #include <utility>
@@ -35,8 +37,9 @@ constexpr auto tick = std::chrono::milliseconds(500);
 constexpr auto closingTick = std::chrono::milliseconds(10);
 constexpr auto closingTime = std::chrono::milliseconds(1500);
 constexpr auto acceptPause = std::chrono::milliseconds(100);
-constexpr auto keptTime = std::chrono::seconds(1); // a connection is not ended for another before it is that idle
-constexpr rlim_t otherFiles = 256;                 // what the host needs besides connections
+constexpr auto standstill = 4 * tick;      // so late, and the process has not run meanwhile
+constexpr std::size_t refusedAtOnce = 64;  // connections beyond the limit that are told so
+constexpr rlim_t otherFiles = 256;         // what the host needs besides connections
 
 /// Lets the process have as many open files as it has connections, if the system allows it.
 void AllowOpenFiles(std::size_t connections)
@@ -83,7 +86,7 @@ struct VServer::State : std::enable_shared_from_this<State>
   void AddDocuments() const
   {
     for (const Page::File& file : Page::Files())
-      core->documents.Add({file.target, file.type, std::string(file.content), true});
+      core->documents.Add({file.target, file.type, std::make_shared<const std::string>(file.content), true});
     core->documents.Add({"/openrpc.json", "application/json", core->dispatcher.Api().functions});
     core->documents.Add({"/asyncapi.json", "application/json", core->dispatcher.Api().events});
   }
@@ -91,6 +94,7 @@ struct VServer::State : std::enable_shared_from_this<State>
   void Accept()
   {
     acceptor.async_accept(
+        peer,
         [weak = weak_from_this()](error_code error, Socket socket)
         {
           if (const auto self = weak.lock(); self && self->acceptor.is_open())
@@ -101,39 +105,72 @@ struct VServer::State : std::enable_shared_from_this<State>
   void OnAccepted(error_code error, Socket socket)
   {
     if (error)
-    {
-      // Most likely there are too many open files: try again when some may have been closed.
-      core->refusals.Note(ERefusal::NotAccepted, {}, error.message());
-      acceptTimer.expires_after(acceptPause);
-      acceptTimer.async_wait(
-          [weak = weak_from_this()](error_code cancelled)
-          {
-            if (const auto self = weak.lock(); self && !cancelled && self->acceptor.is_open())
-              self->Accept();
-          });
-      return;
-    }
+      return OnNotAccepted(error);
     error_code ignored;
     (void)socket.set_option(Tcp::no_delay(true), ignored);
-    if (core->connections.Count() < core->options.limits.connections || MakeRoom())
-      StartHttp(std::move(socket), core);
+    std::string client = peer.address().to_string();
+    const std::size_t count = core->connections.Count();
+    if (count < core->options.limits.connections || MakeRoom())
+      StartHttp(std::move(socket), std::move(client), core);
     else
     {
-      core->refusals.Note(ERefusal::TooManyConnections, {}, {});
-      RefuseHttp(std::move(socket), core);
+      core->refusals.Note(ERefusal::TooManyConnections, client, {});
+      if (count < core->options.limits.connections + refusedAtOnce)
+        RefuseHttp(std::move(socket), std::move(client), core);
     }
     Accept();
   }
 
-  /// Ends the connection that has been waiting for its client the longest: so those who open many and do nothing with
-  /// them, or send and read a little at a time, keep nobody out.
+  /// Most likely there are too many open files. Newcomers would wait in vain until somebody leaves: room is made for
+  /// them, or each is told by the end of its connection, for which a file is kept open.
+  void OnNotAccepted(error_code error)
+  {
+    core->refusals.Note(ERefusal::NotAccepted, {}, error.message());
+    const bool tooMany = error == asio::error::no_descriptors ||
+                         error == boost::system::errc::too_many_files_open_in_system;
+    if (tooMany && MakeRoom())
+      return Accept();
+    if (tooMany && spare)
+      TurnAway();
+    acceptTimer.expires_after(acceptPause);
+    acceptTimer.async_wait(
+        [weak = weak_from_this()](error_code cancelled)
+        {
+          if (const auto self = weak.lock(); self && !cancelled && self->acceptor.is_open())
+            self->Accept();
+        });
+  }
+
+  void TurnAway()
+  {
+    spare.reset();
+    error_code ignored;
+    acceptor.non_blocking(true, ignored);
+    error_code failed;
+    for (std::size_t i = 0; i < refusedAtOnce && !failed; ++i)
+    {
+      Socket socket(postal->Context().get_executor());
+      acceptor.accept(socket, failed);
+    }
+    KeepSpareFile();
+  }
+
+  void KeepSpareFile()
+  {
+    spare.emplace("/dev/null");
+    if (!spare->is_open())
+      spare.reset();
+  }
+
+  /// Ends a connection for a newcomer: those who open many and do nothing with them, or send and read a little at a
+  /// time, keep nobody out.
   bool MakeRoom() const
   {
-    IConnection* longest = core->connections.LongestWaiting(Clock::now() - keptTime);
-    if (longest == nullptr)
+    IConnection* first = core->connections.FirstToEnd(Clock::now());
+    if (first == nullptr)
       return false;
-    core->refusals.Note(ERefusal::Displaced, {}, {});
-    longest->Abort();
+    core->refusals.Note(ERefusal::Displaced, first->Peer(), {});
+    first->Abort();
     return true;
   }
 
@@ -147,11 +184,20 @@ struct VServer::State : std::enable_shared_from_this<State>
           const auto self = weak.lock();
           if (!self || cancelled || self->core->closing)
             return;
-          const auto now = Clock::now();
-          self->core->connections.ForEach([now](IConnection& connection) { connection.Tick(now); });
-          self->core->refusals.Tick(now);
+          self->OnTick(Clock::now());
           self->Tick();
         });
+  }
+
+  void OnTick(Clock::time_point now)
+  {
+    const auto pause = now - std::exchange(lastTick, now) - tick;
+    // Whoever was stopped has not read what clients have sent meanwhile: it is read before anybody is judged.
+    if (pause > standstill)
+      core->connections.ForEach([pause](IConnection& connection) { connection.Extend(pause); });
+    else
+      core->connections.ForEach([now](IConnection& connection) { connection.Tick(now); });
+    core->refusals.Tick(now);
   }
 
   void BeginClose(std::shared_ptr<std::promise<void>> done)
@@ -191,7 +237,10 @@ struct VServer::State : std::enable_shared_from_this<State>
   const std::shared_ptr<NMX::IAsioPostalService> postal;
   const std::shared_ptr<Core> core;
   Acceptor acceptor;
+  Tcp::endpoint peer; // of the connection that is being accepted
+  std::optional<std::ifstream> spare;
   asio::steady_timer timer;
+  Clock::time_point lastTick = Clock::now();
   asio::steady_timer acceptTimer{postal->Context()};
   std::string address;
   unsigned short port = 0;
@@ -254,6 +303,8 @@ void VServer::Open()
   asio::post(m_state->postal->Context(),
              [state = m_state]
              {
+               state->KeepSpareFile();
+               state->lastTick = Clock::now();
                state->Accept();
                state->Tick();
              });

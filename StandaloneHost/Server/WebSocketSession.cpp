@@ -9,6 +9,7 @@
 #include <boost/beast/websocket.hpp>
 
 #include <algorithm>
+#include <optional>
 #include <utility>
 
 namespace Server
@@ -24,6 +25,7 @@ namespace
 
 constexpr auto handshakeTime = std::chrono::seconds(10);
 constexpr auto closingTime = std::chrono::seconds(2);
+constexpr std::size_t wholeBytes = std::size_t{64} << 10; // a longer message is sent in pieces
 constexpr std::size_t keptBuffer = std::size_t{64} << 10; // for the next message; what a long one took is given back
 
 std::string_view View(const boost::beast::flat_buffer& buffer)
@@ -53,8 +55,8 @@ class WebSocketSession final : public IListener,
 {
 public:
   WebSocketSession(ClientStream client, std::shared_ptr<Core> core)
-      : m_core(std::move(core)), m_stream(CoalescingStream(std::move(client))),
-        m_queue(m_core->options.limits, m_core->outgoingBytes)
+      : m_core(std::move(core)), m_stream(CoalescingStream(std::move(client), m_core->outgoing)),
+        m_queue(m_core->options.limits, m_core->outgoing)
   {
     m_core->connections.Add(*this);
     ++m_core->webSockets;
@@ -67,12 +69,11 @@ public:
     --m_core->webSockets;
   }
 
-  void Start(const http::request<http::string_body>& request)
+  void Start(const http::request<http::string_body>& request, bool offersProtocol)
   {
     m_deadline = Clock::now() + handshakeTime;
     m_stream.read_message_max(m_core->options.limits.messageBytes);
-    const auto offered = request[http::field::sec_websocket_protocol];
-    if (OffersProtocol({offered.data(), offered.size()}))
+    if (offersProtocol)
       m_stream.set_option(websocket::stream_base::decorator(
           [](websocket::response_type& response)
           { response.set(http::field::sec_websocket_protocol, webSocketProtocol.data()); }));
@@ -105,19 +106,33 @@ public:
     if (m_stream.next_layer().TakeSignOfLife() || m_callsInFlight > 0 || m_waitsForOthers)
     {
       m_lastSign = now;
-      m_pinged = false;
+      m_pinged.reset();
       return;
     }
-    const auto silence = now - m_lastSign;
-    const auto pingAfter = m_core->options.limits.pingAfter;
-    if (silence > 2 * pingAfter)
+    const std::chrono::seconds pingAfter(m_core->options.limits.pingAfterSeconds);
+    if (!m_pinged && now - m_lastSign > pingAfter)
+    {
+      m_stream.next_layer().GatherPing();
+      m_pinged = now;
+    }
+    else if (m_pinged && now - *m_pinged > pingAfter)
     {
       m_core->refusals.Note(ERefusal::Silent, Client().Peer(), {});
       Abort();
     }
-    else if (silence > pingAfter && !std::exchange(m_pinged, true))
-      m_stream.next_layer().GatherPing();
   }
+
+  void Extend(Clock::duration pause) override
+  {
+    if (m_deadline != Clock::time_point::max())
+      m_deadline += pause;
+    m_lastSign += pause;
+    if (m_pinged)
+      *m_pinged += pause;
+    m_stream.next_layer().ExtendTeardown(pause);
+  }
+
+  [[nodiscard]] std::string Peer() const override { return m_stream.next_layer().next_layer().Peer(); }
 
   void ReadOn() override
   {
@@ -141,7 +156,7 @@ private:
     m_open = true;
     m_deadline = Clock::time_point::max();
     m_lastSign = Clock::now();
-    Send(std::make_shared<const std::string>(m_core->dispatcher.Hello(++m_core->lastSession)), EPolicy::Reply, nullptr);
+    Send(std::make_shared<const ResponseText>(m_core->dispatcher.Hello(++m_core->lastSession)), EPolicy::Reply, nullptr);
     if (m_core->closing)
       return Close();
     Read();
@@ -198,7 +213,7 @@ private:
     try
     {
       Count(static_cast<std::ptrdiff_t>(
-          m_core->dispatcher.Handle(text, this, [self = shared_from_this()](std::string answer, std::size_t calls)
+          m_core->dispatcher.Handle(text, this, [self = shared_from_this()](ResponseText answer, std::size_t calls)
                                     { self->OnAnswer(std::move(answer), calls); })));
     }
     catch (const std::exception& failure)
@@ -214,11 +229,11 @@ private:
     m_core->calls.Count(calls);
   }
 
-  void OnAnswer(std::string answer, std::size_t calls)
+  void OnAnswer(ResponseText answer, std::size_t calls)
   {
     Count(-static_cast<std::ptrdiff_t>(calls));
-    if (!answer.empty())
-      Send(std::make_shared<const std::string>(std::move(answer)), EPolicy::Reply, nullptr);
+    if (!answer.Empty())
+      Send(std::make_shared<const ResponseText>(std::move(answer)), EPolicy::Reply, nullptr);
     if (m_open)
       Read();
   }
@@ -241,20 +256,39 @@ private:
   void Pump()
   {
     CoalescingStream& stream = m_stream.next_layer();
-    if (m_closeBegun || !m_stream.is_open())
-    {
-      // One of the two has said goodbye; nothing may follow that.
+    // Once one of the two has said goodbye, nothing may follow but the rest of a message.
+    const bool over = m_closeBegun || !m_stream.is_open();
+    while (!m_queue.Empty() && stream.HasRoom() && (!over || stream.Missing() != 0))
+      GatherFront(stream);
+    if (over && stream.Missing() == 0)
       m_queue.Clear();
-      return;
-    }
-    while (!m_queue.Empty() && stream.HasRoom())
-      stream.GatherText(*m_queue.Pop());
-    if (!m_queue.Empty())
+    else if (!m_queue.Empty())
       stream.WhenRoom([self = shared_from_this()] { self->Pump(); }); // what waits keeps the session
     else if (m_closing)
       BeginClose();
     else if (!m_reading)
       stream.FlushSoon();
+  }
+
+  /// Moves the first message, or as much of a long one as there is room for.
+  void GatherFront(CoalescingStream& stream)
+  {
+    const ResponseText& text = *m_queue.Front();
+    if (stream.Missing() == 0 && text.IsPlain() && text.Size() <= wholeBytes)
+    {
+      stream.GatherText(text.Own());
+      return m_queue.Pop();
+    }
+    if (stream.Missing() == 0)
+      stream.BeginText(text.Size());
+    for (std::string_view piece : text.PiecesFrom(text.Size() - stream.Missing()))
+    {
+      while (!piece.empty() && stream.HasRoom())
+        piece.remove_prefix(stream.GatherPiece(piece));
+      if (!piece.empty())
+        return;
+    }
+    m_queue.Pop();
   }
 
   void Close(websocket::close_code code, const char* reason)
@@ -288,7 +322,7 @@ private:
   Clock::time_point m_deadline = Clock::time_point::max();
   Clock::time_point m_lastSign; // when the client was last known to be there
   std::ptrdiff_t m_callsInFlight = 0;
-  bool m_pinged = false;
+  std::optional<Clock::time_point> m_pinged; // since then nothing has come
   bool m_waitsForOthers = false;
   bool m_open = false;
   bool m_reading = false;
@@ -298,9 +332,10 @@ private:
 
 }
 
-void StartWebSocket(ClientStream stream, http::request<http::string_body> request, std::shared_ptr<Core> core)
+void StartWebSocket(ClientStream stream, const http::request<http::string_body>& request, bool offersProtocol,
+                    std::shared_ptr<Core> core)
 {
-  std::make_shared<WebSocketSession>(std::move(stream), std::move(core))->Start(request);
+  std::make_shared<WebSocketSession>(std::move(stream), std::move(core))->Start(request, offersProtocol);
 }
 
 }

@@ -11,8 +11,9 @@
 namespace Server
 {
 
-/// Takes over a stream whose client asked for a WebSocket, and serves it until it ends. [server]
-void StartWebSocket(ClientStream stream, boost::beast::http::request<boost::beast::http::string_body> request,
-                    std::shared_ptr<Core> core);
+/// Takes over a stream whose client asked for a WebSocket, and serves it until it ends. `offersProtocol`: whether the
+/// client is told the protocol that is spoken. [server]
+void StartWebSocket(ClientStream stream, const boost::beast::http::request<boost::beast::http::string_body>& request,
+                    bool offersProtocol, std::shared_ptr<Core> core);
 
 }

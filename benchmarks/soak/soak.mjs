@@ -26,7 +26,7 @@ const kinds = [...Array(7).fill('BasicObjects'), 'SmartObjects', 'SmartObjects',
 const subjects = names.map((name, i) => ({ name, kind: kinds[i % kinds.length] }));
 const pick = list => list[Math.floor(Math.random() * list.length)];
 const chance = share => Math.random() < share;
-const counts = { connected: 0, calls: 0, answers: 0, notifications: 0, resets: 0, malformed: 0, stalled: 0,
+const counts = { connected: 0, raved: 0, calls: 0, answers: 0, notifications: 0, resets: 0, malformed: 0, stalled: 0,
                  refused: 0 };
 
 let stalled = 0;
@@ -68,6 +68,30 @@ const unfitFrames = [
   () => Buffer.from([0x81, 0xff, 0, 0, 0, 0, 0x7f, 0, 0, 0, 0, 0, 0, 0]), () => frame(Buffer.from([3]), 0x88),
   () => noise(300),
 ];
+
+// What never ends: framing around nothing, questions that need no token. Each is written over and over.
+const at = host => `Host: 127.0.0.1:${host.port}\r\n`;
+const endless = [
+  host => [`POST /rpc HTTP/1.1\r\n${at(host)}Transfer-Encoding: chunked\r\n\r\n1;`, 'x'.repeat(16384)],
+  host => [`POST /rpc HTTP/1.1\r\n${at(host)}Transfer-Encoding: chunked\r\n\r\n0\r\n`, 'a: b\r\n'.repeat(2000)],
+  host => [`POST /rpc HTTP/1.1\r\n${at(host)}Transfer-Encoding: chunked\r\n\r\n`, '0'.repeat(16384)],
+  host => ['', `OPTIONS * HTTP/1.1\r\n${at(host)}\r\n`],
+  host => ['', `HEAD / HTTP/1.1\r\n${at(host)}\r\n`],
+];
+
+// Writes without end for a while, and does not care what is answered.
+async function rave(host) {
+  const socket = net.connect(host.port, '127.0.0.1').on('error', () => {});
+  socket.resume();
+  const [first, more] = pick(endless)(host);
+  socket.write(first);
+  for (let i = 0; i < 20 && !socket.destroyed; ++i) {
+    socket.write(more);
+    await sleep(10 + Math.random() * 50);
+  }
+  socket.destroy();
+  ++counts.raved;
+}
 
 // One client's life: it sends for a while, and ends in one of several ways.
 function live(host, running) {
@@ -123,6 +147,8 @@ function live(host, running) {
         ++stalled;
         ++counts.stalled;
         socket.pause();
+        for (let i = 0; i < 10; ++i)
+          write(`[${Array.from({ length: 200 }, () => '{"jsonrpc":"2.0","id":1,"method":"rpc.discover"}').join()}]`);
         for (let i = 0; i < 200; ++i)
           write(JSON.stringify({ jsonrpc: '2.0', id: ++counts.calls, method: 'rpc.discover' }));
         timer = setTimeout(end, 2000 + Math.random() * 4000);
@@ -140,7 +166,7 @@ async function crowd(host, running) {
   await Promise.all(Array.from({ length: connections }, async () => {
     await sleep(Math.random() * 1000);
     while (running())
-      await live(host, running);
+      await (chance(0.03) ? rave(host) : live(host, running));
   }));
 }
 

@@ -257,7 +257,8 @@ class RawFrames(unittest.TestCase):
               for code in (1000, 1001, 1002, 1003, 1007, 1011, 3000, 4999)],
             ('the longest reason', 1000, close(1000, b'x' * 123)),
             ('half a code', 1002, frame(CLOSE, b'\x03')),
-            *[(f'code {code}', 1002, close(code)) for code in (0, 999, 1004, 1005, 1006, 1015, 1016, 2999)],
+            *[(f'code {code}', 1002, close(code)) for code in (0, 999, 1004, 1005, 1006, 1015, 1016, 2999, 5000, 65535)],
+            ('a code that cannot be, with a reason', 1002, close(5000, b'x' * 123)),
             # Whatever comes after a goodbye is not looked at.
             ('a call after it', 1000, close(1000) + frame(TEXT, CALL)),
             ('garbage after it', 1000, close(1000) + b'\xff' * 1000),
@@ -334,9 +335,12 @@ class RawFrames(unittest.TestCase):
             ('with many headers', b'431', handshake(**{f'X_{i}': 'a' for i in range(3000)})),
             ('with a space before the colon', b'400', handshake().replace(b'Upgrade:', b'Upgrade :')),
             ('with NUL in a header', b'400', handshake(X_Nul='a\0b')),
+            ('with two keys', b'400', handshake().replace(b'Upgrade: w', b'Sec-WebSocket-Key: AAAA\r\nUpgrade: w')),
+            ('with a body', b'400', handshake(Content_Length='5') + b'12345'),
+            ('with a frame that comes before the answer', b'400', handshake() + frame(TEXT, CALL)),
         ]:
             with self.subTest(what):
-                answer = http(sent.replace(b'\r\n\r\n', b'\r\nX-End: 1\r\n\r\n'), half_close=not status.startswith(b'1'))
+                answer = http(sent.replace(b'\r\n\r\n', b'\r\nX-End: 1\r\n\r\n', 1), half_close=not status.startswith(b'1'))
                 self.assertEqual(answer[:13], b'HTTP/1.1 ' + status + b' ', answer)
                 if status == b'426':
                     self.assertIn(b'Sec-WebSocket-Version: 13', answer)

@@ -13,7 +13,7 @@ import { promisify } from 'node:util';
 import { SubjectStoreClient } from '../../clients/typescript/dist/index.js';
 import { askColor, crateColor, limits, subjects } from './crate.mjs';
 import { binary, inTime, refusedStart, scaled, temporaryDirectory, temporaryFile, withHost } from './host.mjs';
-import { Connection, handshake, post, RawSocket, rawRequest, request } from './wire.mjs';
+import { Connection, handshake, post, RawSocket, rawRequest, request, withConnection } from './wire.mjs';
 
 const folder = temporaryDirectory();
 const [certificate, key, otherKey, lockedKey] = ['cert', 'key', 'other-key', 'locked-key']
@@ -75,6 +75,9 @@ describe('Encrypted', () => {
     assert.equal(await commandLine(host, 'call', 'BasicObjectServices.Color', 'Crate', '--tls-ca', certificate), '#ff3366cc\n');
     await assert.rejects(commandLine(host, 'call', 'BasicObjectServices.Color', 'Crate'), /not trusted/);
 
+    const rsaKeyExchange = { maxVersion: 'TLSv1.2', ciphers: 'AES256-GCM-SHA384:AES128-SHA' };
+    await assert.rejects(askEncrypted(host, rsaKeyExchange), /handshake failure/);
+
     const plain = await request({ url: host.url.replace('https', 'http') }, { body: askColor() });
     assert.deepEqual([plain.status, plain.body], [400, 'This port speaks https.\n']);
     await refused(host, /handshake failed/);
@@ -107,7 +110,8 @@ describe('Encrypted', () => {
       [['--tls-cert', certificate, '--tls-key', folder], /private key/],
       [['--tls-cert', certificate, '--tls-key', otherKey], /private key ".*other-key\.pem"/],
       [['--tls-cert', certificate, '--tls-key', lockedKey], /private key ".*locked-key\.pem"/],
-      [['--ping-after', '0'], /ping-after/], [['--ping-after', '99999'], /ping-after/],
+      [['--ping-after', '0'], /ping-after/], [['--max-connections', '99999'], /--max-connections: expected 4 to 65536/],
+      [['--max-connections', '10', '--max-websockets', '11'], /--max-websockets: expected at most 10/],
     ];
     for (const [options, says] of refusedOptions) {
       const { status, lines } = await refusedStart(['--data', ':memory:', '--listen', '127.0.0.1:0', ...options]);
@@ -168,6 +172,156 @@ test('Connections that do nothing make room for others', () => withHost({ subjec
   assert.match(await webSockets[0].exchange('', /$/), /Server\.Hello/);
   for (const raw of [...webSockets, ...idle])
     raw.socket.destroy();
+}));
+
+// What the host takes up in memory, in bytes.
+function residentBytes(host) {
+  return Number(readFileSync(`/proc/${host.pid}/statm`, 'utf8').split(' ')[1]) * 4096;
+}
+
+// Runs `during`, and all the while asks over new connections.
+async function newcomersDuring(host, during, headers = {}) {
+  let over = false;
+  const asking = (async () => {
+    while (!over) {
+      assert.equal((await post(host, 'BasicObjectServices.Color', ['Crate'], headers)).result?.code, 0);
+      await sleep(5);
+    }
+  })();
+  try {
+    await during();
+  } finally {
+    over = true;
+    await asking;
+  }
+}
+
+test('Framing without end takes no memory, whether a token is shown or not', () => {
+  const token = 'open sesame';
+  const options = ['--token-file', temporaryFile('token', token)];
+  return withHost({ subjects, options }, async host => {
+    const at = `HTTP/1.1\r\nHost: 127.0.0.1:${host.port}\r\n`;
+    const known = `Authorization: Bearer ${token}\r\n`;
+    const flood = 'x'.repeat(65536);
+    const endless = [
+      [`OPTIONS * ${at}Transfer-Encoding: chunked\r\n\r\n0\r\na: `, flood], [`OPTIONS * ${at}a: `, flood],
+      [`GET / ${at}Transfer-Encoding: chunked\r\n\r\n`, '0'.repeat(65536)],
+      [`POST /rpc ${at}${known}Transfer-Encoding: chunked\r\n\r\n1;`, flood],
+      [`POST /rpc ${at}${known}Transfer-Encoding: chunked\r\n\r\n`, '0'.repeat(65536)],
+      [`POST /rpc ${at}${known}Transfer-Encoding: chunked\r\n\r\n0\r\n`, 'a: b\r\n'.repeat(10000)],
+    ];
+    const before = residentBytes(host);
+    await newcomersDuring(host, () => Promise.all(endless.map(async ([head, more]) => {
+      const raw = await RawSocket.open(host);
+      raw.socket.write(head);
+      for (let sent = 0; sent < 64 << 20 && !raw.socket.destroyed && raw.text === ''; sent += more.length)
+        await new Promise(done => raw.socket.write(more, done));
+      assert.match(raw.text, /^HTTP\/1\.1 4(00|31) /, head);
+      raw.socket.destroy();
+    })), { Authorization: `Bearer ${token}` });
+    assert.ok(residentBytes(host) - before < 16 << 20, `${residentBytes(host) - before} bytes more`);
+    await refused(host, /127\.0\.0\.1: not a request that can be read/);
+  });
+});
+
+test('Many long batches take no more than they may, and newcomers are served', () => withHost({ subjects }, async host => {
+  const describe = Array.from({ length: limits.batchCalls }, (_, id) => ({ jsonrpc: '2.0', id, method: 'rpc.discover' }));
+  const batch = JSON.stringify([...describe.slice(1), { jsonrpc: '2.0', id: 'edit', method: 'BasicObjectServices.SetEnabled',
+                                                        params: ['Crate', false] }]);
+  const { body } = await request(host, { body: batch });
+  assert.ok(Buffer.byteLength(body) < limits.outgoingBytes + (1 << 20));
+  const parts = JSON.parse(body);
+  assert.equal(parts.length, limits.batchCalls);
+  const codes = [...new Set(parts.map(part => part.error?.code ?? 'described'))];
+  assert.deepEqual(codes, ['described', -32000]);
+  assert.deepEqual(parts.at(-1), { jsonrpc: '2.0', id: 'edit',
+                                   error: { code: -32000, message: parts.at(-1).error.message } });
+  assert.equal((await post(host, 'BasicObjectServices.Enabled', ['Crate'])).result.outputs.Enabled, true);
+  await withConnection(host, async connection => {
+    assert.equal((await connection.exchange(batch)).length, body.length);
+  });
+
+  const before = residentBytes(host);
+  const posted = await Promise.all(Array.from({ length: 100 }, () => RawSocket.open(host)));
+  let most = 0;
+  await newcomersDuring(host, async () => {
+    for (const raw of posted) {
+      raw.socket.pause();
+      raw.socket.write(rawRequest(host, batch));
+    }
+    for (let i = 0; i < 20; ++i) {
+      await sleep(50);
+      most = Math.max(most, residentBytes(host) - before);
+    }
+  });
+  assert.ok(most < 64 << 20, `${most} bytes more`);
+  for (const raw of posted)
+    raw.socket.destroy();
+}));
+
+test('Strangers that keep talking keep nobody out', () => {
+  const options = ['--max-connections', '100', '--token-file', temporaryFile('token', 'sesame')];
+  return withHost({ subjects, options }, async host => {
+    const headers = { Authorization: 'bearer sesame' };
+    let talking = true;
+    const talk = async () => {
+      while (talking) {
+        const raw = await RawSocket.open(host);
+        while (talking && !raw.socket.destroyed) {
+          raw.socket.write(`OPTIONS * HTTP/1.1\r\nHost: 127.0.0.1:${host.port}\r\n\r\n`);
+          await Promise.race([raw.ended, sleep(300)]);
+        }
+        raw.socket.destroy();
+        await sleep(50);
+      }
+    };
+    const strangers = Array.from({ length: 120 }, talk);
+    await sleep(500);
+    for (let i = 0; i < 50; ++i)
+      assert.equal((await post(host, 'BasicObjectServices.Color', ['Crate'], headers)).result?.code, 0);
+    talking = false;
+    await Promise.all(strangers);
+  });
+});
+
+test('Newcomers are told, not kept waiting, when there are no more open files', () => {
+  const launcher = ['prlimit', '--nofile=90', '--'];
+  return withHost({ subjects, launcher, options: ['--max-connections', '40'] }, async host => {
+    execFileSync('prlimit', ['--pid', host.pid, '--nofile=40:40']);
+    const waiting = [];
+    for (let i = 0; i < 40; ++i)
+      waiting.push(await RawSocket.open(host));
+    assert.equal((await post(host, 'BasicObjectServices.Color', ['Crate'])).result.code, 0);
+    const webSockets = [];
+    const full = (async () => {
+      while (webSockets.length < 40)
+        webSockets.push(await Connection.open(host));
+    })();
+    await assert.rejects(full);
+    assert.equal((await webSockets[0].call('BasicObjectServices.BasicObjectList')).result.code, 0);
+    for (const one of webSockets)
+      one.socket.terminate();
+    for (const raw of waiting)
+      raw.socket.destroy();
+  });
+});
+
+test('Who was stopped for a while ends nobody for it', () => withHost({ subjects, options: ['--ping-after', '1'] },
+                                                                      async host => {
+  const idle = await Promise.all(Array.from({ length: 10 }, () => Connection.open(host)));
+  const half = await RawSocket.open(host);
+  half.socket.write('POST /rpc HTTP/1.1\r\n');
+  await sleep(1200); // some have been pinged
+  process.kill(host.pid, 'SIGSTOP');
+  await sleep(4000);
+  process.kill(host.pid, 'SIGCONT');
+  await sleep(2500);
+  for (const one of idle)
+    assert.equal((await one.call('BasicObjectServices.BasicObjectList')).result.code, 0);
+  assert.ok(!half.socket.destroyed);
+  half.socket.destroy();
+  for (const one of idle)
+    one.socket.terminate();
 }));
 
 test('A client that does not answer pings is ended, one that answers stays',

@@ -108,17 +108,54 @@ describe('HTTP', () => {
   test('offers what it says, and nothing else', () => withHost({ subjects }, async host => {
     const table = [
       ['GET', '/openrpc.json', 200, /^application\/json/], ['GET', '/', 200, /^text\/html/],
-      ['GET', '/rpc', 4], ['PUT', '/rpc', 405], ['DELETE', '/rpc', 405], ['POST', '/openrpc.json', 405],
-      ['POST', '/', 405], ['GET', '/nowhere', 404], ['POST', '/nowhere', 404], ['GET', '/rpc/', 404],
-      ['GET', '/../etc/passwd', 404], ['GET', '//', 404],
+      ['GET', '/?x=1', 200, /^text\/html/], ['HEAD', '/', 200, /^text\/html/], ['HEAD', '/openrpc.json', 200],
+      ['GET', '/rpc', 4], ['HEAD', '/rpc', 405], ['PUT', '/rpc', 405], ['DELETE', '/rpc', 405],
+      ['POST', '/openrpc.json', 405], ['POST', '/', 405], ['GET', '/nowhere', 404], ['HEAD', '/nowhere', 404],
+      ['POST', '/nowhere', 404], ['GET', '/rpc/', 404], ['GET', '/../etc/passwd', 404], ['GET', '//', 404],
+      ['OPTIONS', '/nowhere', 204], ['POST', '/rpc?x=1', 200],
     ];
     for (const [method, path, status, type] of table) {
-      const answer = await request(host, { method, path, body: method === 'GET' ? undefined : askColor() });
+      const bodiless = ['GET', 'HEAD', 'OPTIONS'].includes(method);
+      const answer = await request(host, { method, path, body: bodiless ? undefined : askColor() });
       assert.match(String(answer.status), new RegExp(`^${status}`), `${method} ${path}`);
       if (status === 405)
         assert.ok(answer.headers.allow, `${method} ${path} tells what is allowed`);
       if (type)
         assert.match(answer.headers['content-type'], type);
+    }
+    const [whole, head] = await Promise.all(['GET', 'HEAD'].map(method => request(host, { method, path: '/openrpc.json' })));
+    assert.equal(Number(head.headers['content-length']), Buffer.byteLength(whole.body));
+  }));
+
+  test('reads each request in one way only, and nothing behind one that it refuses', () => withHost({ subjects },
+                                                                                                  async host => {
+    const at = `Host: 127.0.0.1:${host.port}\r\n`;
+    const json = 'Content-Type: application/json\r\n';
+    const body = askColor();
+    const sized = `Content-Length: ${body.length}\r\n\r\n${body}`;
+    const hidden = `POST /rpc HTTP/1.1\r\n${at}${sized}`;
+    const table = [
+      [`POST http://127.0.0.1:${host.port}/rpc HTTP/1.1\r\nHost: elsewhere\r\n${sized}`, 200],
+      [`POST http://elsewhere/rpc HTTP/1.1\r\n${at}${sized}`, 403],
+      [`HEAD / HTTP/1.1\r\n${at}\r\n`, 200],
+      [`POST /rpc HTTP/1.1\r\n${at}expect: 100-Continue\r\n${json}Connection: close\r\nContent-Length: ${body.length}\r\n\r\n`, 100],
+      [`POST /rpc HTTP/1.1\r\n${at}Expect: miracles\r\n${sized}`, 417],
+      [`POST /rpc HTTP/1.1\r\n${at}Transfer-Encoding: gzip\r\n\r\n${hidden}`, 501],
+      [`POST /rpc HTTP/1.1\r\n${sized}`, 400],
+      [`POST /rpc HTTP/1.1\r\n${at}${at}${sized}`, 400],
+      [`GET / HTTP/1.1\r\n${at}Content-Length: ${hidden.length}\r\n\r\n${hidden}`, 400],
+      [`OPTIONS * HTTP/1.1\r\n${at}Transfer-Encoding: chunked\r\n\r\n0\r\n\r\n${hidden}`, 400],
+      [`POST / HTTP/1.1\r\n${at}Content-Length: ${hidden.length}\r\n\r\n${hidden}`, 405],
+    ];
+    for (const [bytes, status] of table) {
+      const raw = await RawSocket.open(host);
+      await raw.exchange(bytes, /\r\n\r\n/);
+      if (status >= 400)
+        await inTime(raw.ended, `the connection is closed after ${status}`);
+      assert.deepEqual([...raw.text.matchAll(/HTTP\/1\.1 (\d+)/g)].map(([, code]) => Number(code)), [status], bytes);
+      if (status === 200)
+        assert.equal(raw.text.includes('#ff3366cc'), bytes.startsWith('POST'), bytes);
+      raw.socket.destroy();
     }
   }));
 
@@ -218,15 +255,20 @@ describe('HTTP', () => {
     assert.deepEqual(JSON.parse(body), crateColor());
   }));
 
-  test('answers a connection too many with 503', () => withHost({ subjects }, async host => {
-    const idle = [];
-    while (idle.length < limits.connections)
-      idle.push(...await Promise.all(Array.from({ length: 50 }, () => RawSocket.open(host))));
+  test('answers a connection too many with 503', () => withHost({ subjects, options: ['--max-connections', '40'] },
+                                                                async host => {
     const ask = raw => raw.exchange(rawRequest(host, askColor()), /\r\n\r\n/);
+    const busy = [];
+    for (let i = 0; i < 40; ++i) {
+      busy.push(await RawSocket.open(host));
+      assert.match(await ask(busy.at(-1)), /^HTTP\/1\.1 200 /);
+    }
     const excess = await RawSocket.open(host);
     assert.match(await ask(excess), /^HTTP\/1\.1 503 /);
-    assert.match(await ask(idle[0]), /^HTTP\/1\.1 200 /);
-    for (const raw of [...idle, excess])
+    busy[0].text = '';
+    assert.match(await ask(busy[0]), /^HTTP\/1\.1 200 /);
+    assert.match(host.stderr, /Refused 127\.0\.0\.1: there are too many connections/);
+    for (const raw of [...busy, excess])
       raw.socket.destroy();
     let last = '';
     for (let i = 0; i < 50 && !last.startsWith('HTTP/1.1 200 '); ++i) {

@@ -90,6 +90,8 @@ struct Stage
   {
     Server::ServerOptions options;
     options.port = 0;
+    options.limits.messageBytes = 4096;
+    options.limits.outgoingBytes = std::size_t{96} << 10; // a batch of descriptions comes to more
     return options;
   }
 

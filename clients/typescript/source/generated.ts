@@ -3,7 +3,7 @@
 import type { CallOptions, Caller, Inputs, Method, Outputs, Result } from './types.js';
 
 /** What the greeting of a host with the same API says in `api`. */
-export const apiHash = 'e491c5f7a9482f4d3a197bbfb148f83ef245d515ced6833b2c429d96d3d7fb40';
+export const apiHash = 'f46e803e7e1661f99f777523f54987f03056498f955485bb28ae4e6df48e60bd';
 
 /** Every result code by name; failures have the highest bit set. */
 export const ResultCode = {
@@ -1239,13 +1239,13 @@ export interface Hello {
     callsInFlight: number;
     /** Calls of all connections at the same time; more wait. */
     callsInFlightOverall: number;
-    /** Bytes that wait for the client to read them. */
+    /** Bytes that wait for the client to read them; also the longest response. */
     outgoingBytes: number;
     /** Bytes that wait for all clients together; beyond, each has its share only. */
     outgoingBytesOverall: number;
     /** Notifications that wait for the client to read them and may not stand for each other. */
     outgoingNotifications: number;
-    /** Silence after which the client is pinged; as long again, and the connection is ended. */
+    /** Seconds of silence after which a WebSocket client is pinged; as long again, and the connection is ended. */
     pingAfterSeconds: number;
   };
   levels: {

@@ -23,7 +23,7 @@ struct Listener final : IListener
   void Notify(const SharedMessage& message, EPolicy policy, const void*) override
   {
     messages.push_back(message);
-    texts.push_back((policy == EPolicy::Change ? "change " : "sequence ") + *message);
+    texts.push_back((policy == EPolicy::Change ? "change " : "sequence ") + message->Own());
     if (leave)
       leave();
   }

@@ -10,14 +10,17 @@ namespace
 
 Server::SharedMessage Message(std::string text)
 {
-  return std::make_shared<const std::string>(std::move(text));
+  return std::make_shared<const Server::ResponseText>(std::move(text));
 }
 
 std::vector<std::string> Drain(Server::OutgoingQueue& queue)
 {
   std::vector<std::string> texts;
   while (!queue.Empty())
-    texts.push_back(*queue.Pop());
+  {
+    texts.push_back(queue.Front()->Flat());
+    queue.Pop();
+  }
   return texts;
 }
 
@@ -26,8 +29,7 @@ std::vector<std::string> Drain(Server::OutgoingQueue& queue)
 TEST(OutgoingQueue, MergesChangesOfOneCallbackAndNothingElse)
 {
   const Server::Limits limits;
-  std::size_t overall = 0;
-  Server::OutgoingQueue queue(limits, overall);
+  Server::OutgoingQueue queue(limits, std::make_shared<Server::OutgoingBytes>(limits));
   const int first = 0, second = 0;
   EXPECT_TRUE(queue.Push(Message("change 1"), EPolicy::Change, &first));
   EXPECT_TRUE(queue.Push(Message("reply"), EPolicy::Reply));
@@ -47,8 +49,7 @@ TEST(OutgoingQueue, TellsWhenTheClientIsTooSlow)
   Server::Limits limits;
   limits.outgoingBytes = 10;
   limits.outgoingNotifications = 2;
-  std::size_t overall = 0;
-  Server::OutgoingQueue queue(limits, overall);
+  Server::OutgoingQueue queue(limits, std::make_shared<Server::OutgoingBytes>(limits));
   EXPECT_TRUE(queue.Push(Message("1234567"), EPolicy::Reply));
   EXPECT_FALSE(queue.Push(Message("1234"), EPolicy::Reply));
   EXPECT_TRUE(queue.Push(Message("s"), EPolicy::Sequence));
@@ -65,7 +66,7 @@ TEST(OutgoingQueue, LeavesEachClientItsShareWhenTooMuchWaitsForAll)
   limits.outgoingBytes = 80;
   limits.outgoingBytesOverall = 100;
   limits.connections = 10;
-  std::size_t overall = 0;
+  const auto overall = std::make_shared<Server::OutgoingBytes>(limits);
   Server::OutgoingQueue good(limits, overall);
   {
     Server::OutgoingQueue greedy(limits, overall);
@@ -73,7 +74,7 @@ TEST(OutgoingQueue, LeavesEachClientItsShareWhenTooMuchWaitsForAll)
     EXPECT_TRUE(good.Push(Message(std::string(20, 'x')), EPolicy::Reply));
     EXPECT_FALSE(good.Push(Message("x"), EPolicy::Reply)) << "more than its share, and all is taken";
     EXPECT_EQ(Drain(good).size(), 1U);
-    EXPECT_EQ(overall, 80U);
+    EXPECT_EQ(overall->Total(), 80U);
     const int callback = 0;
     EXPECT_TRUE(greedy.Push(Message(""), EPolicy::Change, &callback));
     EXPECT_TRUE(good.Push(Message(std::string(20, 'x')), EPolicy::Change, &callback));
@@ -81,9 +82,9 @@ TEST(OutgoingQueue, LeavesEachClientItsShareWhenTooMuchWaitsForAll)
     EXPECT_EQ(Drain(good).size(), 1U);
     EXPECT_TRUE(good.Push(Message(std::string(10, 'x')), EPolicy::Reply));
     EXPECT_TRUE(good.Push(Message(std::string(10, 'x')), EPolicy::Reply));
-    EXPECT_EQ(overall, 100U);
+    EXPECT_EQ(overall->Total(), 100U);
     EXPECT_EQ(Drain(good).size(), 2U);
   }
-  EXPECT_EQ(overall, 0U) << "what waited for a client that has gone is not counted any more";
+  EXPECT_EQ(overall->Total(), 0U) << "what waited for a client that has gone is not counted any more";
   EXPECT_TRUE(good.Push(Message(std::string(80, 'x')), EPolicy::Reply));
 }
