@@ -40,6 +40,8 @@ export async function withStrangeHost(text, reply, body) {
       return response.writeHead(200, { 'Content-Type': type }).end(built(file));
     if (request.url === '/openrpc.json')
       return response.end(text());
+    if (request.method !== 'POST')
+      return response.writeHead(404).end(); // a page that tries for a WebSocket again
     let asked = '';
     for await (const part of request)
       asked += part;
