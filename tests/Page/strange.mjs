@@ -4,6 +4,8 @@ import { once } from 'node:events';
 import { readFileSync } from 'node:fs';
 import { createServer } from 'node:http';
 
+import { inTime } from '../EndToEnd/waiting.mjs';
+
 // The file of the built page.
 export const built = name => readFileSync(new URL(`../../StandaloneHost/Page/built/${name}`, import.meta.url));
 
@@ -46,7 +48,7 @@ export async function withStrangeHost(text, reply, body) {
     response.end(reply(asked));
   });
   server.listen(0, '127.0.0.1');
-  await once(server, 'listening');
+  await inTime(once(server, 'listening'), 'the server listens');
   const { port } = server.address();
   try {
     await body({ url: `http://127.0.0.1:${port}`, ws: `ws://127.0.0.1:${port}/rpc` });
