@@ -115,12 +115,32 @@ PanelCase {
         verify(find(item => item.subMenu === undefined && item.text === "Tom & Jerry" && item.contentItem === undefined), "a name shows as it is")
         leaveMenu()
         select("B")
-        openMenu(rowOf("B"), "Apply preset", "Red")
-        press(lineOf("Apply preset"))
+        for (const seen of [() => true, () => panel.selectedSubjects.length === 0]) {
+            add("BasicObjects", "C")
+            select("C")
+            openMenu(rowOf("C"), "Apply preset", "Red")
+            stage.remove("C")
+            tryVerify(seen)
+            press(lineOf("Red"))
+            byName(notThere)
+            press(byName("Dismiss"))
+            tryVerify(() => gone(notThere))
+        }
+    }
+
+    function test_aMenuIsForWhatItWasOpenedFor() {
+        add("BasicObjects", "A", "B", "C")
+        select("A", "B")
+        openMenu(rowOf("A"), "Disable")
         stage.remove("B")
-        wait(50)
-        press(lineOf("Red"))
+        tryVerify(() => panel.selectedSubjects.length === 1)
+        press(lineOf("Disable"))
         byName(notThere)
+        verify(stage.entry("A", "Parameters/Enabled"), "all of it or nothing")
+        tryVerify(() => lineOf("Disable") === null)
+        choose(rowOf("A"), "Enable or disable")
+        tryVerify(() => !stage.entry("A", "Parameters/Enabled"))
+        verify(stage.entry("C", "Parameters/Enabled"))
     }
 
     function test_charactersAreCalibrated() {
