@@ -42,6 +42,8 @@ export async function withStrangeHost(text, reply, body) {
       return response.writeHead(200, { 'Content-Type': type }).end(built(file));
     if (request.url === '/openrpc.json')
       return response.end(text());
+    if (request.method !== 'POST') // the page tries now and then whether there is a WebSocket
+      return response.end();
     let asked = '';
     for await (const part of request)
       asked += part;
