@@ -254,7 +254,7 @@ describe('describe and completion', () => {
     const entries = [...document.methods, ...document['x-callbacks']];
     for (const { name, 'x-level': level } of entries)
       assert.match(stdout, new RegExp(`^    ${name.replace(/^\w+\./, '')} *${level === 1 ? '\\[preview\\]' : '[^[]?'}`, 'm'));
-    for (const entry of entries.slice(0, 20)) {
+    for (const entry of entries.filter((_, i) => i % 16 === 0)) {
       assert.deepEqual((await json(host, ['describe', entry.name])).value, entry);
       const { stdout: text } = await run(host, ['describe', entry.name]);
       for (const { name, description } of entry.params)
