@@ -56,7 +56,8 @@ export class Child {
   // What it has written, and how it has ended.
   get report() {
     const { status, signal, failure } = this.outcome ?? {};
-    const state = !this.hasEnded ? 'runs' : failure ? `did not start: ${failure.message}` : `has ended with ${signal ?? status}`;
+    const end = failure ? `did not start: ${failure.message}` : `has ended with ${signal ?? status}`;
+    const state = this.hasEnded ? end : 'runs';
     return `${this.#words}\n${state}, and wrote:\n${this.stdout.slice(-4000)}${this.stderr.slice(-4000)}`;
   }
 
@@ -116,7 +117,8 @@ export async function outputOf(command, words, options) {
 
 // Runs a program to its end while everything else stands still; what it wrote to standard output.
 export function runSync(command, words, options) {
-  return execFileSync(command, words, { timeout: scaled(15000), killSignal: 'SIGKILL', stdio: 'pipe', encoding: 'utf8', ...options });
+  return execFileSync(command, words, { timeout: scaled(15000), killSignal: 'SIGKILL', stdio: 'pipe', encoding: 'utf8',
+                                        ...options });
 }
 
 // Runs `body`, and kills whatever it has started and not seen end.

@@ -217,14 +217,21 @@ describe('HTTP', () => {
   }));
 
   test('answers a connection too many with 503', () => withHost({ subjects }, async host => {
-    const idle = [];
-    while (idle.length < limits.connections)
-      idle.push(...await Promise.all(Array.from({ length: 50 }, () => RawSocket.open(host))));
+    const open = (count, sent, answer) => Promise.all(Array.from({ length: count }, async () => {
+      const raw = await RawSocket.open(host);
+      return await raw.exchange(sent, answer) && raw;
+    }));
+    // Those that are idle make room once they are idle for a second; WebSockets never do.
+    const upgrade = rawRequest(host, '', { method: 'GET', headers: Object.entries(handshake).map(h => h.join(': ')) });
+    const webSockets = [];
+    while (webSockets.length < limits.webSockets)
+      webSockets.push(...await open(64, upgrade, /Server\.Hello/));
+    const idle = await open(limits.connections - limits.webSockets, rawRequest(host, askColor()), /\r\n\r\n/);
     const ask = raw => raw.exchange(rawRequest(host, askColor()), /\r\n\r\n/);
     const excess = await RawSocket.open(host);
     assert.match(await ask(excess), /^HTTP\/1\.1 503 /);
     assert.match(await ask(idle[0]), /^HTTP\/1\.1 200 /);
-    for (const raw of [...idle, excess])
+    for (const raw of [...webSockets, ...idle, excess])
       raw.socket.destroy();
     await until('there is room again', async () => {
       const raw = await RawSocket.open(host);

@@ -526,7 +526,8 @@ TEST_F(PanelTest, DevicesAreListedWithWhatTheyAreLinkedTo)
   SetApplication("Application/Devices/a/Type", {});
   SetApplication("Application/Devices/a/Connected", {});
   WaitUntil([&] { return listed() == Names{"b", "false", "Glove"}; });
-  WaitUntil([&] { return selection->Selection() == std::vector<SelectionItem>{{{}, -1, "b"}}; }); // nothing that has gone
+  const std::vector<SelectionItem> left{{{}, -1, "b"}};
+  WaitUntil([&] { return selection->Selection() == left; });
   shadow.Check();
   EXPECT_EQ(work.setClusterPattern(VStoreIdGadget(glove), 0, 5).Name(), "Ok");
   EXPECT_EQ(work.setClusterPattern(VStoreIdGadget(glove), 0, -1).Name(), "InvalidValue");
