@@ -10,7 +10,7 @@ import net from 'node:net';
 import { setTimeout as sleep } from 'node:timers/promises';
 import { isMainThread, parentPort, Worker, workerData } from 'node:worker_threads';
 
-import { scaled, startHost } from '../../tests/EndToEnd/host.mjs';
+import { inTime, scaled, startHost } from '../../tests/EndToEnd/host.mjs';
 import { handshake, rawRequest, withConnection } from '../../tests/EndToEnd/wire.mjs';
 
 const seconds = Number(process.argv[2] ?? 60);
@@ -222,7 +222,8 @@ async function soak() {
   const running = () => performance.now() - start < seconds * 1000;
   const worker = new Worker(new URL(import.meta.url), { argv: process.argv.slice(2), workerData: { url, ws, port } });
   const answered = new Promise((done, failed) => worker.on('message', done).on('error', failed));
-  const [times, samples] = await Promise.all([answered, watch(host, running, start), crowd(host, running)]);
+  const everything = Promise.all([answered, watch(host, running, start), crowd(host, running)]);
+  const [times, samples] = await inTime(everything, 'the end of all clients', (seconds + 60) * 1000, () => counts);
   await sleep(2500); // for those who were closed and did not read
   report(times, samples, processState(host.pid).memory);
   const unexpected = host.stderr.split('\n').filter(line => !expectedInLog.test(line));

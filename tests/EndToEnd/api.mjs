@@ -2,10 +2,9 @@
 
 import assert from 'node:assert/strict';
 import { readFileSync } from 'node:fs';
-import { setTimeout as sleep } from 'node:timers/promises';
-import { isDeepStrictEqual } from 'node:util';
+import { inspect, isDeepStrictEqual } from 'node:util';
 
-import { scaled, withHost } from './host.mjs';
+import { until, withHost } from './host.mjs';
 import { withConnection } from './wire.mjs';
 
 export const published = JSON.parse(readFileSync(new URL('../Catalogue/published-api.json', import.meta.url), 'utf8'));
@@ -96,13 +95,9 @@ export async function outputsOf(connection, method, params) {
 
 // Asks until the answer is what it should come to.
 export async function eventually(question, expected) {
-  const deadline = Date.now() + scaled(5000);
-  for (;;) {
-    const answer = await question();
-    if (isDeepStrictEqual(answer, expected) || Date.now() > deadline)
-      return assert.deepEqual(answer, expected);
-    await sleep(10);
-  }
+  let answer;
+  await until(inspect(expected), async () => isDeepStrictEqual(answer = await question(), expected),
+              { pause: 10, seen: () => answer });
 }
 
 // Runs `body` with a connection to a host with these subjects.

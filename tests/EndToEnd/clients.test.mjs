@@ -1,7 +1,6 @@
 // The same small walk through the API with clients that know nothing of each other.
 
 import assert from 'node:assert/strict';
-import { execFile } from 'node:child_process';
 import { once } from 'node:events';
 import { test } from 'node:test';
 
@@ -10,7 +9,8 @@ import jsonRpc from 'json-rpc-2.0';
 import WebSocket from 'ws';
 
 import { changed, failure, functions, inputs } from './api.mjs';
-import { inTime, scaled, withHost } from './host.mjs';
+import { outputOf } from './children.mjs';
+import { inTime, withHost } from './host.mjs';
 
 const subjects = [
   { name: 'Crate', parameters: { ColourRGBA: '#ff3366cc' }, markers: [[0, 0, 0], [120, 0, 0], [0, 80, 0]] },
@@ -28,12 +28,11 @@ function mailbox() {
       wake();
     },
     async take(matches, what) {
-      for (;;) {
-        const index = messages.findIndex(matches);
-        if (index >= 0)
-          return messages.splice(index, 1)[0];
-        await inTime(new Promise(done => { wake = done; }), what);
-      }
+      await inTime(new Promise(done => {
+        wake = () => messages.some(matches) && done();
+        wake();
+      }), what, undefined, () => messages);
+      return messages.splice(messages.findIndex(matches), 1)[0];
     },
   };
 }
@@ -42,15 +41,10 @@ function curl(host) {
   let id = 0;
   return {
     async call(method, params) {
-      const stdout = await new Promise((done, failed) => {
-        const options = ['--silent', '--show-error', '--fail', '--noproxy', '*',
-                         '--max-time', String(scaled(5000) / 1000), '--header', 'Content-Type: application/json',
-                         '--data-binary', '@-'];
-        const child = execFile('curl', [...options, `${host.url}/rpc`],
-                               (error, text) => error ? failed(error) : done(text));
-        child.stdin.end(JSON.stringify({ jsonrpc: '2.0', id: ++id, method, params }));
-      });
-      const answer = JSON.parse(stdout);
+      const options = ['--silent', '--show-error', '--fail', '--noproxy', '*',
+                       '--header', 'Content-Type: application/json', '--data-binary', '@-'];
+      const input = JSON.stringify({ jsonrpc: '2.0', id: ++id, method, params });
+      const answer = JSON.parse(await outputOf('curl', [...options, `${host.url}/rpc`], { input }));
       assert.equal(answer.id, id);
       if (answer.error)
         throw answer.error;
@@ -64,7 +58,7 @@ async function plainWebSocket(host) {
   const socket = new WebSocket(host.ws);
   const mail = mailbox();
   socket.on('message', text => mail.put(JSON.parse(text)));
-  await once(socket, 'open');
+  await inTime(once(socket, 'open'), 'the upgrade');
   let id = 0;
   return {
     async call(method, params) {
@@ -88,7 +82,7 @@ async function jsonRpc2(host) {
   peer.addMethod('Server.Hello', () => {});
   peer.addMethod(changed, params => mail.put({ params }));
   socket.on('message', text => peer.receiveAndSend(JSON.parse(text)));
-  await once(socket, 'open');
+  await inTime(once(socket, 'open'), 'the upgrade');
   return {
     call: (method, params) => inTime(peer.request(method, params), method),
     notification: () => mail.take(() => true, changed),

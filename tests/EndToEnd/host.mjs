@@ -1,12 +1,15 @@
 // Starts the standalone host for a test, and sees to it that the host ends as it should.
 
 import assert from 'node:assert/strict';
-import { spawn } from 'node:child_process';
 import { existsSync, mkdtempSync, readFileSync, realpathSync, rmSync, writeFileSync } from 'node:fs';
 import { tmpdir } from 'node:os';
 import { join, resolve } from 'node:path';
-import { setTimeout as sleep } from 'node:timers/promises';
 import { fileURLToPath } from 'node:url';
+
+import { Child, leavingNothing } from './children.mjs';
+import { inTime, scaled, until } from './waiting.mjs';
+
+export { inTime, scaled, until };
 
 export const binary = resolve(process.env.SUBJECT_STORE_HOST ??
                               fileURLToPath(new URL('../../build/dev/bin/subject-store-host', import.meta.url)));
@@ -16,37 +19,12 @@ export function sharedFolder() {
   return join(realpathSync(binary), '../../share/subject-store');
 }
 
-const slowness = Number(process.env.SUBJECT_STORE_TEST_SLOWNESS ?? 1);
-
 const directories = [];
-const running = new Set();
 
-for (const signal of ['SIGINT', 'SIGTERM', 'SIGHUP'])
-  process.on(signal, () => process.exit(1));
 process.on('exit', () => {
-  for (const child of running)
-    child.kill('SIGKILL');
   for (const directory of directories)
     rmSync(directory, { recursive: true, force: true });
 });
-
-// A time-out in milliseconds, longer for a build that is slow.
-export function scaled(milliseconds) {
-  return milliseconds * slowness;
-}
-
-// The promise's outcome, or a failure that says what did not happen in time.
-export async function inTime(promise, what, milliseconds = 5000) {
-  const timer = new AbortController();
-  const late = sleep(scaled(milliseconds), undefined, { signal: timer.signal })
-    .then(() => { throw new Error(`not within ${scaled(milliseconds)} ms: ${what}`); });
-  late.catch(() => {});
-  try {
-    return await Promise.race([promise, late]);
-  } finally {
-    timer.abort();
-  }
-}
 
 // A directory that lives as long as the test process.
 export function temporaryDirectory() {
@@ -114,24 +92,8 @@ export function configuration(subjects, devices = []) {
 
 // Without a window, whatever the display, unless an environment is given. `launcher`: a command that becomes the host.
 function launch(options, environment, launcher = []) {
-  const [command, ...rest] = [...launcher, binary, ...(environment ? [] : ['--headless']), ...options];
-  const child = spawn(command, rest, { stdio: ['ignore', 'pipe', 'pipe'], env: environment });
-  running.add(child);
-  const process = { child, stderr: '' };
-  process.listening = new Promise(done => child.stdout.setEncoding('utf8').on('data', text => {
-    if (text.includes('listening'))
-      done({ status: 'listening' });
-  }));
-  child.stderr.setEncoding('utf8').on('data', text => { process.stderr += text; });
-  process.ended = new Promise((done, failed) => {
-    child.on('error', failed);
-    child.on('close', (status, signal) => {
-      running.delete(child);
-      done({ status, signal });
-    });
-  });
-  process.ended.catch(() => {});
-  return process;
+  const [command, ...words] = [...launcher, binary, ...(environment ? [] : ['--headless']), ...options];
+  return new Child(command, words, { env: environment });
 }
 
 function assertNoSanitizerReport(stderr) {
@@ -142,12 +104,13 @@ function assertNoSanitizerReport(stderr) {
 export async function refusedStart(options, environment) {
   const process = launch(options, environment);
   try {
-    const { status, signal } = await inTime(Promise.race([process.ended, process.listening]),
-                                            `${options.join(' ')} ends the host`, 10000);
+    await until(`${options.join(' ')} ends the host`, () => process.hasEnded || process.stdout.includes('listening'),
+                { seconds: 10, seen: () => process.report });
+    const { status, signal } = process.outcome ?? { status: 'listening' };
     assertNoSanitizerReport(process.stderr);
     return { status, signal, lines: process.stderr.split('\n').filter(line => line !== '') };
   } finally {
-    process.child.kill('SIGKILL');
+    process.kill();
   }
 }
 
@@ -167,21 +130,20 @@ class Host {
   }
 
   get pid() {
-    return this.#process.child.pid;
+    return this.#process.pid;
   }
 
-  // Asks the host to end, and answers its exit status.
+  // Asks the host to end, and answers its exit status. One that does not end in time is killed.
   async stop(signal = 'SIGTERM', milliseconds = 10000) {
-    this.#process.child.kill(signal);
-    const { status } = await inTime(this.#process.ended, `the host ends after ${signal}`, milliseconds);
-    return status;
+    this.#process.signal(signal);
+    return (await this.#process.end(`the host ends after ${signal}`, milliseconds)).status;
   }
 
   // Takes the host's life at once.
   async kill() {
     this.#killed = true;
-    this.#process.child.kill('SIGKILL');
-    await this.#process.ended;
+    this.#process.kill();
+    await this.#process.end('the host ends when it is killed');
   }
 
   async assertEndsWell(signal = 'SIGTERM') {
@@ -201,33 +163,35 @@ export async function startHost({ subjects, devices, config, data = ':memory:', 
   const configurationOptions = text === undefined ? [] : ['--config', temporaryFile('stage.xml', text)];
   const process = launch(['--listen', listen, '--data', data, '--ready-file', readyFile, ...configurationOptions,
                           ...options], environment, launcher);
-  let ended;
-  process.ended.then(how => { ended = how; }, failure => { ended = failure; });
-  const deadline = Date.now() + scaled(15000);
-  while (!existsSync(readyFile)) {
-    if (ended === undefined && Date.now() < deadline) {
-      await sleep(5);
-      continue;
-    }
-    process.child.kill('SIGKILL');
-    throw new Error(`the host did not come up (${JSON.stringify(ended) ?? 'too late'}):\n${process.stderr}`);
-  }
-  // The file appears whole: no second look.
-  const ready = JSON.parse(readFileSync(readyFile, 'utf8'));
-  assert.equal(ready.pid, process.child.pid);
-  return new Host(process, ready);
-}
-
-// Runs `body` with a host, which has to end well afterwards.
-export async function withHost(options, body) {
-  const host = await startHost(options);
   try {
-    await body(host);
+    await until('the host comes up', () => {
+      assert.ok(!process.hasEnded, `the host did not come up: ${process.report}`);
+      return existsSync(readyFile);
+    }, { seconds: 15, seen: () => process.report });
+    // The file appears whole: no second look.
+    const ready = JSON.parse(readFileSync(readyFile, 'utf8'));
+    assert.equal(ready.pid, process.pid);
+    return new Host(process, ready);
   } catch (failure) {
-    await host.kill();
-    if (host.stderr !== '' && failure instanceof Error)
-      failure.message += `\nThe host wrote:\n${host.stderr.slice(-4000)}`;
+    process.kill();
     throw failure;
   }
-  await host.assertEndsWell();
+}
+
+const longestTest = 120000;
+
+// Runs `body` with a host, which has to end well afterwards. Neither the host nor what else the body starts outlives it.
+export function withHost(options, body) {
+  return leavingNothing(async () => {
+    const host = await startHost(options);
+    try {
+      await inTime(body(host), 'the end of a test with a host', longestTest);
+    } catch (failure) {
+      await host.kill();
+      if (host.stderr !== '' && failure instanceof Error)
+        failure.message += `\nThe host wrote:\n${host.stderr.slice(-4000)}`;
+      throw failure;
+    }
+    await host.assertEndsWell();
+  });
 }

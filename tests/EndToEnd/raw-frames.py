@@ -2,6 +2,7 @@
 """WebSocket frames byte by byte, such as no well-behaved client sends: each is closed on with the code that says why, and
 the host goes on to serve others. What the host sends is read by a protocol library that refuses what does not conform."""
 
+import atexit
 import base64
 import json
 import os
@@ -33,12 +34,12 @@ def setUpModule():
     folder = tempfile.TemporaryDirectory(prefix='subject-store-test-')
     ready = pathlib.Path(folder.name, 'ready.json')
     host = subprocess.Popen([HOST, '--headless', '--listen', '127.0.0.1:0', '--data', ':memory:', '--ready-file', ready],
-                            stderr=subprocess.PIPE, text=True)
+                            stderr=open(pathlib.Path(folder.name, 'log'), 'w', encoding='utf-8'))
+    atexit.register(host.kill)
     deadline = time.monotonic() + 3 * PATIENCE
     while not ready.exists():
         if host.poll() is not None or time.monotonic() > deadline:
-            host.kill()
-            raise RuntimeError('the host did not come up:\n' + host.communicate()[1])
+            raise RuntimeError(f'the host did not come up within {3 * PATIENCE} s:\n' + host_log())
         time.sleep(0.005)
     port = int(json.loads(ready.read_text())['url'].rsplit(':', 1)[1])
 
@@ -46,14 +47,18 @@ def setUpModule():
 def tearDownModule():
     host.send_signal(signal.SIGTERM)
     try:
-        log = host.communicate(timeout=3 * PATIENCE)[1]
-    except subprocess.TimeoutExpired:
-        host.kill()
-        raise
+        host.wait(timeout=3 * PATIENCE)
+    except subprocess.TimeoutExpired as late:
+        raise RuntimeError(f'the host did not end within {late.timeout} s:\n' + host_log()) from late
+    log = host_log()
     folder.cleanup()
     for sign in ('Sanitizer', 'runtime error', 'could not be handled'):
         assert sign not in log, log
     assert host.returncode == 0, f'exit status {host.returncode}\n{log}'
+
+
+def host_log():
+    return pathlib.Path(folder.name, 'log').read_text(encoding='utf-8', errors='replace')
 
 
 def resident_bytes():

@@ -1,24 +1,23 @@
 // What the server does not let strangers do: to listen in, to get in without the token, to keep others out.
 
 import assert from 'node:assert/strict';
-import { execFile, execFileSync } from 'node:child_process';
 import { readFileSync } from 'node:fs';
 import https from 'node:https';
 import { join } from 'node:path';
 import { describe, test } from 'node:test';
 import { setTimeout as sleep } from 'node:timers/promises';
 import tls from 'node:tls';
-import { promisify } from 'node:util';
 
 import { SubjectStoreClient } from '../../clients/typescript/dist/index.js';
+import { outputOf, runSync } from './children.mjs';
 import { askColor, crateColor, limits, subjects } from './crate.mjs';
-import { binary, inTime, refusedStart, scaled, temporaryDirectory, temporaryFile, withHost } from './host.mjs';
+import { binary, inTime, refusedStart, temporaryDirectory, temporaryFile, until, withHost } from './host.mjs';
 import { Connection, handshake, post, RawSocket, rawRequest, request, withConnection } from './wire.mjs';
 
 const folder = temporaryDirectory();
 const [certificate, key, otherKey, lockedKey] = ['cert', 'key', 'other-key', 'locked-key']
   .map(name => join(folder, `${name}.pem`));
-const openssl = (...options) => execFileSync('openssl', options, { stdio: 'pipe' });
+const openssl = (...options) => runSync('openssl', options);
 openssl('req', '-x509', '-newkey', 'rsa:2048', '-nodes', '-days', '2', '-subj', '/CN=stage', '-addext',
         'subjectAltName=IP:127.0.0.1', '-keyout', key, '-out', certificate);
 openssl('genrsa', '-out', otherKey, '2048');
@@ -32,8 +31,7 @@ function refusals(host, what) {
 
 // Waits until the host has written so many lines of refusal.
 async function refused(host, what, count = 1) {
-  for (let i = 0; i < 100 && refusals(host, what).length < count; ++i)
-    await sleep(scaled(20));
+  await until(`${count} lines that refuse ${what}`, () => refusals(host, what).length >= count, { seen: () => host.stderr });
   assert.equal(refusals(host, what).length, count, host.stderr);
 }
 
@@ -48,9 +46,8 @@ function askEncrypted(host, options = {}) {
 }
 
 // What the program prints as a client of the host.
-async function commandLine(host, ...words) {
-  const { stdout } = await inTime(promisify(execFile)(binary, [...words, '--server', host.url]), words.join(' '));
-  return stdout;
+function commandLine(host, ...words) {
+  return outputOf(binary, [...words, '--server', host.url]);
 }
 
 describe('Encrypted', () => {
@@ -215,7 +212,7 @@ test('Framing without end takes no memory, whether a token is shown or not', () 
       const raw = await RawSocket.open(host);
       raw.socket.write(head);
       for (let sent = 0; sent < 64 << 20 && !raw.socket.destroyed && raw.text === ''; sent += more.length)
-        await new Promise(done => raw.socket.write(more, done));
+        await inTime(new Promise(done => raw.socket.write(more, done)), 'the host reads or ends the connection', 20000);
       assert.match(raw.text, /^HTTP\/1\.1 4(00|31) /, head);
       raw.socket.destroy();
     })), { Authorization: `Bearer ${token}` });
@@ -287,7 +284,7 @@ test('Strangers that keep talking keep nobody out', () => {
 test('Newcomers are told, not kept waiting, when there are no more open files', () => {
   const launcher = ['prlimit', '--nofile=90', '--'];
   return withHost({ subjects, launcher, options: ['--max-connections', '40'] }, async host => {
-    execFileSync('prlimit', ['--pid', host.pid, '--nofile=40:40']);
+    runSync('prlimit', ['--pid', String(host.pid), '--nofile=40:40']);
     const waiting = [];
     for (let i = 0; i < 40; ++i)
       waiting.push(await RawSocket.open(host));
@@ -330,8 +327,7 @@ test('A client that does not answer pings is ended, one that answers stays',
   let pings = 0;
   lively.socket.on('ping', () => { ++pings; });
   await inTime(silent.closed, 'the silent client is ended', 6000);
-  await sleep(1500);
-  assert.ok(pings >= 2);
+  await until('more pings than one', () => pings >= 2, { seen: () => pings });
   assert.equal((await lively.call('BasicObjectServices.BasicObjectList')).result.code, 0);
   await refused(host, /does not answer pings/);
   lively.socket.terminate();

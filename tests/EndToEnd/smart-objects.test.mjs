@@ -1,7 +1,6 @@
 // The group "SmartObjectServices" over the wire: its functions and refusals, templates, patterns, devices, warnings.
 
 import assert from 'node:assert/strict';
-import { execFileSync } from 'node:child_process';
 import { truncateSync } from 'node:fs';
 import { join } from 'node:path';
 import { describe, test } from 'node:test';
@@ -9,6 +8,7 @@ import { setTimeout as sleep } from 'node:timers/promises';
 
 import { assertFails, assertSucceeds, codes, eventually, functions as allFunctions, inGroup, inputs, outputsOf, published,
          withStage } from './api.mjs';
+import { runSync } from './children.mjs';
 import { inTime, scaled, temporaryDirectory, temporaryFile } from './host.mjs';
 
 const group = 'SmartObjectServices';
@@ -177,7 +177,7 @@ describe('every function', () => {
     const huge = temporaryFile('huge.sot', '');
     truncateSync(huge, 100 << 20);
     const pipe = join(temporaryDirectory(), 'pipe.sot');
-    execFileSync('mkfifo', [pipe]);
+    runSync('mkfifo', [pipe]);
     const broken = { 'cut.sot': sot(clusters('Tip')).slice(0, -9), 'empty.sot': '', 'bare.sot': sot(''),
                      'none.sot': sot(clusters()), 'root.sot': sot(clusters('Tip'), 'SmartObject'),
                      'twice.sot': sot(clusters('Tip', 'Tip')), 'many.sot': sot(clusters(...upTo(65))),

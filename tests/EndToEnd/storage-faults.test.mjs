@@ -2,7 +2,6 @@
 // and nothing that was answered is lost once the fault has gone.
 
 import assert from 'node:assert/strict';
-import { execFileSync, spawnSync } from 'node:child_process';
 import { cpSync, existsSync, mkdirSync, readdirSync, readFileSync, renameSync, rmSync, statfsSync, symlinkSync,
          unlinkSync, writeFileSync } from 'node:fs';
 import { join } from 'node:path';
@@ -10,7 +9,8 @@ import { test } from 'node:test';
 import { setTimeout as sleep } from 'node:timers/promises';
 
 import { assertFails, assertSucceeds, changed, outputsOf, snapshot } from './api.mjs';
-import { scaled, startHost, temporaryDirectory, withHost } from './host.mjs';
+import { runSync } from './children.mjs';
+import { scaled, startHost, temporaryDirectory, until, withHost } from './host.mjs';
 import { withConnection } from './wire.mjs';
 
 const subjects = Array.from({ length: 40 }, (_, i) => ({ name: `Object ${i}` }));
@@ -19,8 +19,7 @@ const setColor = 'BasicObjectServices.SetColor';
 // The lines of the log that match, once there are some: an answer may come before the line that the host wrote first.
 async function lines(host, pattern) {
   const found = () => host.stderr.split('\n').filter(line => pattern.test(line));
-  for (let i = 0; i < 100 && found().length === 0; ++i)
-    await sleep(scaled(20));
+  await until(`a line with ${pattern}`, () => found().length > 0, { seen: () => host.stderr });
   await sleep(20);
   return found();
 }
@@ -94,11 +93,14 @@ function ownDisk() {
     mkdirSync(data);
     const script = 'mount -t tmpfs -o size=2m,mode=700 none "$0" && exec "$@"';
     const launcher = ['unshare', ...namespaces, 'sh', '-c', script, data];
-    if (spawnSync(launcher[0], [...launcher.slice(1), 'true']).status !== 0)
+    try {
+      runSync(launcher[0], [...launcher.slice(1), 'true']);
+    } catch {
       continue;
+    }
     const user = namespaces.length > 1 ? ['--user', '--preserve-credentials'] : [];
     const run = (host, ...command) =>
-      execFileSync('nsenter', ['--target', String(host.pid), '--mount', '--root', ...user, ...command]);
+      runSync('nsenter', ['--target', String(host.pid), '--mount', '--root', ...user, ...command]);
     return { data, launcher, run, place: host => join('/proc', String(host.pid), 'root', data) };
   }
   return undefined;
@@ -140,7 +142,7 @@ test('A file system that is read-only', () => {
 
 test('A file that may not grow', () => {
   const { data } = newFolder();
-  const limit = (host, bytes) => execFileSync('prlimit', ['--pid', host.pid, `--fsize=${bytes}:`].map(String));
+  const limit = (host, bytes) => runSync('prlimit', ['--pid', host.pid, `--fsize=${bytes}:`].map(String));
   return passes({ data, begin: host => limit(host, 0), end: host => limit(host, 'unlimited'),
                   result: 'FileIOFailure', says: /File too large/ });
 });

@@ -7,7 +7,7 @@ import { setTimeout as sleep } from 'node:timers/promises';
 
 import { assertSucceeds, success } from './api.mjs';
 import { askColor, color, crateColor, limits, subjects } from './crate.mjs';
-import { inTime, withHost } from './host.mjs';
+import { inTime, until, withHost } from './host.mjs';
 import { handshake, post, RawSocket, rawRequest, request, withConnection } from './wire.mjs';
 
 describe('WebSocket', () => {
@@ -77,16 +77,14 @@ describe('WebSocket', () => {
       const calls = Array.from({ length: Math.ceil(8 * limits.outgoingBytes / description) },
                                (_, i) => JSON.stringify({ jsonrpc: '2.0', id: `d${i}`, method: 'rpc.discover' }));
       // The host says when it has judged a client; the others are served all the while.
-      const judged = async count => {
-        while (host.stderr.split('reads too slowly').length <= count) {
-          assertSucceeds(await other.call(color.method, color.params), { ColorHtml: '#ff3366cc' });
-          await sleep(10);
-        }
-      };
+      const judged = (count, what) => until(`${what} is judged`, async () => {
+        assertSucceeds(await other.call(color.method, color.params), { ColorHtml: '#ff3366cc' });
+        return host.stderr.split('reads too slowly').length > count;
+      }, { seconds: 20, pause: 10, seen: () => host.stderr });
       late.socket.pause();
       for (const text of calls)
         late.socket.send(text);
-      await inTime(judged(1), 'the client that reads late is judged', 20000);
+      await judged(1, 'the client that reads late');
       late.socket.resume();
       assert.equal(await inTime(late.closed, 'the client that reads late is closed'), 1013);
       assert.ok(late.unexpected.length < calls.length);
@@ -95,7 +93,7 @@ describe('WebSocket', () => {
       never.socket.pause();
       for (const text of calls)
         never.socket.write(frame(text));
-      await inTime(judged(2), 'the client that never reads is judged', 20000);
+      await judged(2, 'the client that never reads');
 
       // Only who writes learns of the end without reading.
       const knocking = setInterval(() => never.socket.write(frame('')), 50);
@@ -255,28 +253,26 @@ describe('HTTP', () => {
     assert.deepEqual(JSON.parse(body), crateColor());
   }));
 
-  test('answers a connection too many with 503', () => withHost({ subjects, options: ['--max-connections', '40'] },
+  test('answers a connection too many with 503', () => withHost({ subjects, options: ['--max-connections', '20',
+                                                                                       '--max-websockets', '20'] },
                                                                 async host => {
     const ask = raw => raw.exchange(rawRequest(host, askColor()), /\r\n\r\n/);
-    const busy = [];
-    for (let i = 0; i < 40; ++i) {
-      busy.push(await RawSocket.open(host));
-      assert.match(await ask(busy.at(-1)), /^HTTP\/1\.1 200 /);
-    }
+    const upgrade = rawRequest(host, '', { method: 'GET', headers: Object.entries(handshake).map(h => h.join(': ')) });
+    // WebSockets never make room.
+    const webSockets = await Promise.all(Array.from({ length: 20 }, async () => {
+      const raw = await RawSocket.open(host);
+      return await raw.exchange(upgrade, /Server\.Hello/) && raw;
+    }));
     const excess = await RawSocket.open(host);
     assert.match(await ask(excess), /^HTTP\/1\.1 503 /);
-    busy[0].text = '';
-    assert.match(await ask(busy[0]), /^HTTP\/1\.1 200 /);
-    assert.match(host.stderr, /Refused 127\.0\.0\.1: there are too many connections/);
-    for (const raw of [...busy, excess])
+    await until('the refusal is in the log', () => /Refused 127\.0\.0\.1: there are too many connections/.test(host.stderr));
+    for (const raw of [...webSockets, excess])
       raw.socket.destroy();
-    let last = '';
-    for (let i = 0; i < 50 && !last.startsWith('HTTP/1.1 200 '); ++i) {
+    await until('there is room again', async () => {
       const raw = await RawSocket.open(host);
-      last = await ask(raw);
+      const text = await ask(raw);
       raw.socket.destroy();
-      await sleep(20);
-    }
-    assert.match(last, /^HTTP\/1\.1 200 /);
+      return text.startsWith('HTTP/1.1 200 ');
+    }, { pause: 20 });
   }));
 });

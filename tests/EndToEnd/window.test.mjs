@@ -19,22 +19,21 @@ function assertNoComplaint(host) {
   assert.doesNotMatch(host.stderr, /\[Qt\]|qrc:|\.qml/);
 }
 
-for (const signal of ['SIGTERM', 'SIGINT'])
-  test(`A host with a window serves calls and ends well on ${signal}`, async () => {
-    const data = temporaryDirectory();
-    writeFileSync(join(data, 'window.ini'), '[window]\nwidth=none\nx=99999\n\u0000]]theme=');
-    const host = await startHost({ subjects, data, environment: display });
-    try {
-      assertSucceeds(await post(host, 'BasicObjectServices.BasicObjectList'), { Names: ['Crate'] });
-      await sleep(scaled(1500)); // the window is drawn, and has looked at the server
-      assertSucceeds(await post(host, 'BasicObjectServices.BasicObjectList'), { Names: ['Crate'] });
-    } catch (failure) {
-      await host.kill();
-      throw failure;
-    }
-    await host.assertEndsWell(signal);
-    assertNoComplaint(host);
-  });
+test('A host with a window serves calls and ends well', async () => {
+  const data = temporaryDirectory();
+  writeFileSync(join(data, 'window.ini'), '[window]\nwidth=none\nx=99999\n\u0000]]theme=');
+  const host = await startHost({ subjects, data, environment: display });
+  try {
+    assertSucceeds(await post(host, 'BasicObjectServices.BasicObjectList'), { Names: ['Crate'] });
+    await sleep(scaled(1500)); // the window is drawn, and has looked at the server: it does so once a second
+    assertSucceeds(await post(host, 'BasicObjectServices.BasicObjectList'), { Names: ['Crate'] });
+  } catch (failure) {
+    await host.kill();
+    throw failure;
+  }
+  await host.assertEndsWell('SIGINT');
+  assertNoComplaint(host);
+});
 
 test('A signal that comes while the host starts is not lost', async () => {
   const host = await startHost({ subjects, environment: display });

@@ -4,7 +4,7 @@ import http from 'node:http';
 import net from 'node:net';
 import WebSocket from 'ws';
 
-import { inTime } from './host.mjs';
+import { inTime } from './waiting.mjs';
 
 // One HTTP request: { status, headers, body }. `port` is the local one, to tell connections apart.
 export function request(host, { method = 'POST', path = '/rpc', headers = {}, body, agent = false } = {}) {
@@ -61,6 +61,7 @@ export class Connection {
     });
     connection.socket.on('message', (data, binary) => connection.#receive(data, binary));
     await inTime(new Promise((done, failed) => connection.socket.on('open', done).on('error', failed)), 'the upgrade');
+    connection.socket._socket.unref(); // only a wait keeps the test's process alive
     connection.hello = await connection.#next(connection.notifications, 'the greeting');
     return connection;
   }
@@ -144,7 +145,7 @@ export class RawSocket {
 
   static async open(host) {
     const raw = new RawSocket();
-    raw.socket = net.connect(host.port, '127.0.0.1');
+    raw.socket = net.connect(host.port, '127.0.0.1').unref();
     raw.ended = new Promise(done => raw.socket.on('close', done));
     raw.socket.setEncoding('latin1').on('data', part => {
       raw.text += part;
@@ -166,10 +167,7 @@ export class RawSocket {
       this.#changed = () => pattern.test(this.text) && done(this.text);
       this.#changed();
     });
-    return inTime(arrived, `${pattern} arrives`).catch(failure => {
-      failure.message += `\nArrived so far: ${JSON.stringify(this.text.slice(0, 2000))}`;
-      throw failure;
-    });
+    return inTime(arrived, `${pattern} arrives`, undefined, () => this.text.slice(0, 2000));
   }
 }
 

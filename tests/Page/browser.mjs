@@ -4,13 +4,18 @@ import assert from 'node:assert/strict';
 
 import { chromium } from 'playwright-core';
 
-import { scaled } from '../EndToEnd/host.mjs';
+import { inTime, scaled } from '../EndToEnd/waiting.mjs';
 
 const executablePath = process.env.SUBJECT_STORE_BROWSER ?? '/usr/bin/chromium';
 
 export function launchBrowser(...args) {
   return chromium.launch({ executablePath, timeout: scaled(30000),
                            args: ['--no-sandbox', '--disable-gpu', '--disable-dev-shm-usage', ...args] });
+}
+
+// Browsers do not always end when they are asked to.
+export function closeBrowser(browser) {
+  return inTime(browser?.close(), 'the browser ends', 10000);
 }
 
 // Runs `body` with the page of a host, opened at `hash`. Afterwards the page must have raised no error, have broken no
@@ -35,7 +40,7 @@ export async function withPage(browser, host, { hash = '', expected = /^$/, ...o
   });
   try {
     await page.goto(`${host.url}/${hash}`);
-    await body(page);
+    await inTime(body(page), 'the end of a test with a page', 120000, () => wrong);
     assert.deepEqual(wrong, []);
   } finally {
     await context.close();

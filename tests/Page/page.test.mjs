@@ -1,7 +1,6 @@
 // The page, in a browser, on a real host.
 
 import assert from 'node:assert/strict';
-import { execFile } from 'node:child_process';
 import { readFileSync } from 'node:fs';
 import { createServer } from 'node:http';
 import { createRequire } from 'node:module';
@@ -10,12 +9,12 @@ import { after, before, describe, test } from 'node:test';
 import { promisify } from 'node:util';
 
 import { callbacks, changed, functions, inGroup, inputs, outputs, outputsOf, published } from '../EndToEnd/api.mjs';
+import { outputOf } from '../EndToEnd/children.mjs';
 import { startHost, temporaryDirectory, temporaryFile, withHost } from '../EndToEnd/host.mjs';
 import { request, withConnection } from '../EndToEnd/wire.mjs';
-import { about, connected, launchBrowser, openForm, send, snippet, withPage } from './browser.mjs';
+import { about, closeBrowser, connected, launchBrowser, openForm, send, snippet, withPage } from './browser.mjs';
 import { built, description, files, markup, withStrangeHost } from './strange.mjs';
 
-const run = promisify(execFile);
 const axe = readFileSync(createRequire(import.meta.url).resolve('axe-core/axe.min.js'), 'utf8');
 const awkward = ["O'Brien's axe & 50 % $HOME `id`", 'Élan 🗡'];
 const spaces = text => text.replace(/\s+/g, ' ').trim();
@@ -36,7 +35,7 @@ describe('The page', () => {
   });
 
   after(async () => {
-    await browser?.close();
+    await closeBrowser(browser);
     await host?.assertEndsWell();
   });
 
@@ -155,9 +154,9 @@ describe('The page', () => {
       await enabled.getByRole('tab', { name: 'curl' }).click();
       await enabled.getByRole('button', { name: /^Copy the snippet/ }).click();
       const copied = await page.evaluate(() => navigator.clipboard.readText());
-      answered((await run('bash', ['-c', copied])).stdout);
+      answered(await outputOf('bash', ['-c', copied]));
       const python = temporaryFile('call.py', await snippet(enabled, 'Python'));
-      answered((await run('python3', [python])).stdout);
+      answered(await outputOf('python3', [python]));
       const printed = page.waitForEvent('console');
       await page.evaluate(await snippet(enabled, 'JavaScript'));
       answered((await printed).text());
@@ -189,7 +188,8 @@ describe('The page', () => {
     assert.equal(await page.evaluate(() => document.activeElement.textContent), 'JavaScript');
   }));
 
-  for (const colorScheme of ['light', 'dark'])
+  // In the dark, everything but the colours is the same.
+  for (const [colorScheme, rules] of [['light', {}], ['dark', { runOnly: ['color-contrast'] }]])
     test(`is accessible and fits, ${colorScheme}`, () => onPage({ colorScheme }, async page => {
       await connected(page);
       await send(await openForm(page, 'BasicObjectServices.SetEnabled', { Name: 'Nobody' }));
@@ -198,7 +198,7 @@ describe('The page', () => {
       await page.evaluate(axe);
       for (const width of [1440, 360]) {
         await page.setViewportSize({ width, height: 900 });
-        const { violations } = await page.evaluate(() => axe.run());
+        const { violations } = await page.evaluate(options => axe.run(options), rules);
         assert.deepEqual(violations.map(({ id, nodes }) => [id, ...nodes.map(({ html }) => html)]), [], `${width}`);
       }
       for (const width of [1440, 1280, 960, 640, 360, 320]) { // 640: 1280 at 200 %
@@ -241,7 +241,7 @@ describe('The page of another host', () => {
     browser = await launchBrowser('--host-resolver-rules=MAP evil.example 127.0.0.1');
   });
 
-  after(() => browser?.close());
+  after(() => closeBrowser(browser));
 
   test('connects again to a host that was started anew', async () => {
     const first = await startHost({ subjects: [{ name: 'Crate' }] });
@@ -294,8 +294,8 @@ describe('The page of another host', () => {
   test('asks for the token, and uses it; all of it encrypted', async () => {
     const [folder, token] = [temporaryDirectory(), 'Secret+/=~token'];
     const [certificate, key] = [join(folder, 'cert.pem'), join(folder, 'key.pem')];
-    await run('openssl', ['req', '-x509', '-newkey', 'rsa:2048', '-nodes', '-days', '2', '-subj', '/CN=stage', '-addext',
-                          'subjectAltName=IP:127.0.0.1', '-keyout', key, '-out', certificate]);
+    await outputOf('openssl', ['req', '-x509', '-newkey', 'rsa:2048', '-nodes', '-days', '2', '-subj', '/CN=stage', '-addext',
+                               'subjectAltName=IP:127.0.0.1', '-keyout', key, '-out', certificate]);
     const options = ['--token-file', temporaryFile('token', `${token}\n`), '--tls-cert', certificate, '--tls-key', key];
     const trusting = { env: { ...process.env, CURL_CA_BUNDLE: certificate, SSL_CERT_FILE: certificate } };
     await withHost({ subjects: [{ name: 'Crate' }], options },
@@ -312,9 +312,9 @@ describe('The page of another host', () => {
       assert.match(await send(list), /Crate$/);
       const filled = async (language, assignment) => (
         (await snippet(list, language)).replace(/(token =|TOKEN=).*/, assignment));
-      assert.match((await run('bash', ['-c', await filled('curl', `TOKEN='${token}'`)], trusting)).stdout, /"Crate"/);
+      assert.match(await outputOf('bash', ['-c', await filled('curl', `TOKEN='${token}'`)], trusting), /"Crate"/);
       const python = await filled('Python', `token = "${token}"`);
-      assert.match((await run('python3', [temporaryFile('call.py', python)], trusting)).stdout, /'Crate'/);
+      assert.match(await outputOf('python3', [temporaryFile('call.py', python)], trusting), /'Crate'/);
       const printed = page.waitForEvent('console', message => message.text().startsWith('{'));
       await page.evaluate(await filled('JavaScript', `token = '${token}';`));
       assert.match((await printed).text(), /"Crate"/);

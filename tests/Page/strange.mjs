@@ -4,6 +4,8 @@ import { once } from 'node:events';
 import { readFileSync } from 'node:fs';
 import { createServer } from 'node:http';
 
+import { inTime } from '../EndToEnd/waiting.mjs';
+
 // The file of the built page.
 export const built = name => readFileSync(new URL(`../../StandaloneHost/Page/built/${name}`, import.meta.url));
 
@@ -40,15 +42,15 @@ export async function withStrangeHost(text, reply, body) {
       return response.writeHead(200, { 'Content-Type': type }).end(built(file));
     if (request.url === '/openrpc.json')
       return response.end(text());
-    if (request.method !== 'POST')
-      return response.writeHead(404).end(); // a page that tries for a WebSocket again
+    if (request.method !== 'POST') // the page tries now and then whether there is a WebSocket
+      return response.end();
     let asked = '';
     for await (const part of request)
       asked += part;
     response.end(reply(asked));
   });
   server.listen(0, '127.0.0.1');
-  await once(server, 'listening');
+  await inTime(once(server, 'listening'), 'the server listens');
   const { port } = server.address();
   try {
     await body({ url: `http://127.0.0.1:${port}`, ws: `ws://127.0.0.1:${port}/rpc` });

@@ -139,7 +139,7 @@ TestCase {
         let line = null
         texts.forEach((text, i) => {
             tryVerify(() => (line = lineOf(text)) !== null, 3000, text)
-            wait(50) // the menu is laid out
+            settle(line)
             if (i < texts.length - 1)
                 press(line)
         })
@@ -173,7 +173,7 @@ TestCase {
             let line = null
             tryVerify(() => (line = lineOf(text)) !== null, 3000, text)
             verify(line.enabled, text + " is enabled")
-            wait(50) // the menu is laid out
+            settle(line)
             press(line)
         }
         tryVerify(() => lineOf(texts[0]) === null, 3000, "the menu closes")
@@ -183,7 +183,7 @@ TestCase {
     function openPalette(): Item {
         let grid = null
         tryVerify(() => (grid = find(item => item.cellWidth !== undefined)) !== null, 3000, "a palette opens")
-        wait(50)
+        settle(grid)
         return grid
     }
 
@@ -220,14 +220,18 @@ TestCase {
         mouseMove(test.view, 1, 1)
     }
 
-    /// Waits until an item is moved no more.
+    /// Waits until an item is laid out, with all that it is in, and moved no more.
     function settle(item: Item) {
-        let before = NaN
+        let before = Qt.point(NaN, NaN)
         tryVerify(() => {
             const last = before
-            before = item.mapToItem(test.view, 0, 0).y
-            return before === last
-        })
+            before = item.mapToItem(test.view, 0, 0)
+            return before.x === last.x && before.y === last.y && isLaidOut(item)
+        }, 5000, "it is moved no more")
+    }
+
+    function isLaidOut(item: Item): bool {
+        return item === null || (!isPolishScheduled(item) && isLaidOut(item.parent))
     }
 
     /// Clicks an editor; the pane scrolls to what has the focus.

@@ -36,6 +36,7 @@ PanelCase {
         choose(rowOf("B"), "Colour…")
         const third = openPalette().itemAtIndex(9)
         stage.remove("A")
+        tryVerify(() => panel.selectedSubjects.length === 1)
         press(third)
         byName(notThere)
         compare(stage.entry("B", path), marked)
@@ -77,6 +78,7 @@ PanelCase {
         byText(data.head)
         type("Late")
         stage.remove("B")
+        tryVerify(() => panel.selectedSubjects.length === 1)
         press(byText("Create"))
         byText(notThere)
         compare(stage.entry("A", data.path), "Crew")
@@ -115,12 +117,32 @@ PanelCase {
         verify(find(item => item.subMenu === undefined && item.text === "Tom & Jerry" && item.contentItem === undefined), "a name shows as it is")
         leaveMenu()
         select("B")
-        openMenu(rowOf("B"), "Apply preset", "Red")
-        press(lineOf("Apply preset"))
+        for (const seen of [() => true, () => panel.selectedSubjects.length === 0]) {
+            add("BasicObjects", "C")
+            select("C")
+            openMenu(rowOf("C"), "Apply preset", "Red")
+            stage.remove("C")
+            tryVerify(seen)
+            press(lineOf("Red"))
+            byName(notThere)
+            press(byName("Dismiss"))
+            tryVerify(() => gone(notThere))
+        }
+    }
+
+    function test_aMenuIsForWhatItWasOpenedFor() {
+        add("BasicObjects", "A", "B", "C")
+        select("A", "B")
+        openMenu(rowOf("A"), "Disable")
         stage.remove("B")
-        wait(50)
-        press(lineOf("Red"))
+        tryVerify(() => panel.selectedSubjects.length === 1)
+        press(lineOf("Disable"))
         byName(notThere)
+        verify(stage.entry("A", "Parameters/Enabled"), "all of it or nothing")
+        tryVerify(() => lineOf("Disable") === null)
+        choose(rowOf("A"), "Enable or disable")
+        tryVerify(() => !stage.entry("A", "Parameters/Enabled"))
+        verify(stage.entry("C", "Parameters/Enabled"))
     }
 
     function test_charactersAreCalibrated() {
@@ -239,6 +261,7 @@ PanelCase {
         byText("Remove subject?")
         verify(gone(option), "an object has nothing that is assigned to it")
         stage.remove("AdaHip")
+        tryVerify(() => panel.selectedSubjects.length === 0)
         press(byText("Remove"))
         byText(notThere)
         press(byText("Cancel"))

@@ -81,8 +81,7 @@ PanelCase {
         compare(stage.entry("Crate", "Parameters/ColourRGBA"), "#ff12abef")
         tryCompare(rowOf("Crate"), "colour", "#ff12abef")
         press(byText("Colour: choose from a palette"))
-        byText("Colour") // the palette's heading
-        wait(50) // it is laid out
+        settle(byText("Colour")) // the palette's heading
         keyClick(Qt.Key_Home)
         keyClick(Qt.Key_Right)
         keyClick(Qt.Key_Down)

@@ -70,7 +70,7 @@ PanelCase {
             const before = stage.entry("A", "Parameters/Enabled")
             open()
             tryVerify(() => lineOf("Rename") !== null)
-            wait(50) // the menu is laid out
+            settle(lineOf("Rename"))
             keyClick(Qt.Key_Down)
             keyClick(Qt.Key_Return)
             tryVerify(() => lineOf("Rename") === null && stage.entry("A", "Parameters/Enabled") === !before)

@@ -182,8 +182,8 @@ PanelCase {
         // Filled by a client while the menu is open.
         press(slotRow("Chest"), Qt.RightButton)
         tryVerify(() => lineOf("Assign Crate") !== null)
+        settle(lineOf("Assign Crate"))
         stage.remove("Crate")
-        wait(50) // the menu is laid out
         press(lineOf("Assign Crate"))
         byText("It is no longer there.")
         press(slotRow("Hips"), Qt.RightButton)

@@ -172,6 +172,7 @@ PanelCase {
 
         openMenu(rowBeneath("Hand", "Front"), "Device", "urn:two")
         stage.remove("Hand")
+        tryVerify(() => rows.totalCount === 0)
         press(lineOf("urn:two"))
         byName(notThere)
     }

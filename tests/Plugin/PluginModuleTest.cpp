@@ -10,6 +10,7 @@
 
 #include <gmock/gmock.h>
 
+#include <chrono>
 #include <dlfcn.h>
 #include <fstream>
 #include <future>
@@ -75,11 +76,12 @@ TEST(PluginModule, RegistersTheGroupsThatTheMaskAllowsAndSurvivesItsDestruction)
     {
       const bool evaluates = (mask & 0x200U) != 0;
       std::string_view text = evaluates ? "[\"Nobody\", \"Crate\"]" : "[\"Nobody\"]";
-      std::promise<NMX::IResult> result;
-      server->kept->Invoke(text, [&](const NMX::IServerReply& reply) { result.set_value(reply.Result()); });
+      const auto reply = std::make_shared<std::promise<NMX::IResult>>();
+      auto result = reply->get_future();
+      server->kept->Invoke(text, [reply](const NMX::IServerReply& made) { reply->set_value(made.Result()); });
+      ASSERT_EQ(result.wait_for(std::chrono::seconds(20)), std::future_status::ready);
       // This host has no object evaluation.
-      EXPECT_EQ(result.get_future().get(),
-                NMX::IResult(evaluates ? NMX::EResult::NotSupported : NMX::EResult::NotFound));
+      EXPECT_EQ(result.get(), NMX::IResult(evaluates ? NMX::EResult::NotSupported : NMX::EResult::NotFound));
     }
   }
   postal->Stop();

@@ -15,6 +15,7 @@
 #include "SubjectStoreUI/VPanelRowsModel.h"
 #include "SubjectStoreUI/VSubjectPanelQml.h"
 #include "SubjectStoreUI/VSubjectStoreQml.h"
+#include "tests/Support/Eventually.h"
 #include "tests/Support/LogCapture.h"
 #include "tests/Support/ManualAsioPostal.h"
 #include "tests/Support/ModelFixture.h"
@@ -105,15 +106,17 @@ protected:
     return *m_panel;
   }
 
-  /// Lets everything be told that is to be told.
-  void Wait()
+  /// Lets be told what is to be told, until something holds.
+  template <class Condition>
+  void WaitUntil(Condition condition)
   {
-    for (int i = 0; i < 20; ++i)
+    const auto step = [this]
     {
       gui->RunAll();
       QCoreApplication::processEvents(QEventLoop::AllEvents, 20);
-      QThread::msleep(10);
-    }
+      QThread::msleep(1);
+    };
+    EXPECT_TRUE(Eventually(condition, step));
   }
 
   static VStoreIdGadget Gadget(Id id) { return VStoreIdGadget(id); }
@@ -290,11 +293,9 @@ TEST_F(PanelTest, ElementsAreBackAfterTheStoreWasEmpty)
   {
     const Id id = Add(ESubjectKind::BasicObjects, name);
     Set(id, Paths::Markers(), std::vector<NMX::Position>{{1, 2, 3}});
-    Wait();
-    EXPECT_THAT(NamesBeneath(section, section.index(0, 0)), ElementsAre("Marker 1")) << name;
+    WaitUntil([&] { return NamesBeneath(section, section.index(0, 0)) == Names{"Marker 1"}; });
     Remove(id);
-    Wait();
-    EXPECT_EQ(section.rowCount(), 0);
+    WaitUntil([&] { return section.rowCount() == 0; });
   }
 }
 
@@ -507,13 +508,16 @@ TEST_F(PanelTest, DevicesAreListedWithWhatTheyAreLinkedTo)
   const Id glove = Add(ESubjectKind::SmartObjects, "Glove");
   EXPECT_EQ(panel.rebootSubjects(List({glove})).Reason(), "No device is linked to what is selected.");
   Set(glove, Paths::SmartClusters(), std::vector<NMX::SmartCluster>{{"Back", "b", 1, "Corvex1"}, {"Palm", "a", 2, ""}});
-  Wait();
+  const auto listed = [&devices]
+  {
+    Names texts;
+    for (int row = 0; row < devices.rowCount(); ++row)
+      for (const int role : {VDeviceModel::Urn, VDeviceModel::Connected, VDeviceModel::LinkedTo})
+        texts.push_back(devices.index(row, 0).data(role).toString().toStdString());
+    return texts;
+  };
+  WaitUntil([&] { return listed() == Names{"a", "false", "Glove", "b", "true", "Glove"}; });
   shadow.Check();
-  Names told;
-  for (int row = 0; row < devices.rowCount(); ++row)
-    for (const int role : {VDeviceModel::Urn, VDeviceModel::Connected, VDeviceModel::LinkedTo})
-      told.push_back(devices.index(row, 0).data(role).toString().toStdString());
-  EXPECT_THAT(told, ElementsAre("a", "false", "Glove", "b", "true", "Glove"));
 
   const VResultGadget rebooted = panel.rebootSubjects(List({glove}));
   EXPECT_EQ(rebooted.Name(), "NotConnected") << "the other was tried all the same";
@@ -521,11 +525,10 @@ TEST_F(PanelTest, DevicesAreListedWithWhatTheyAreLinkedTo)
   selection->Select({{{}, -1, "a"}, {{}, -1, "b"}});
   SetApplication("Application/Devices/a/Type", {});
   SetApplication("Application/Devices/a/Connected", {});
-  Wait();
+  WaitUntil([&] { return listed() == Names{"b", "false", "Glove"}; });
+  const std::vector<SelectionItem> left{{{}, -1, "b"}};
+  WaitUntil([&] { return selection->Selection() == left; });
   shadow.Check();
-  ASSERT_EQ(devices.rowCount(), 1);
-  EXPECT_EQ(devices.index(0, 0).data(VDeviceModel::Connected), false);
-  EXPECT_EQ(selection->Selection(), (std::vector<SelectionItem>{{{}, -1, "b"}})) << "what has gone is not selected";
   EXPECT_EQ(work.setClusterPattern(VStoreIdGadget(glove), 0, 5).Name(), "Ok");
   EXPECT_EQ(work.setClusterPattern(VStoreIdGadget(glove), 0, -1).Name(), "InvalidValue");
   EXPECT_EQ(work.setClusterPattern(VStoreIdGadget(glove), 2, 1).Name(), "InvalidIndex");
@@ -553,21 +556,19 @@ TEST_F(PanelTest, CalibrationSaysWhatIsPossibleAndWhyNot)
 
   QAbstractItemModel& setup = *panel.subjectSetupParameterModel();
   EXPECT_TRUE(setup.setData(setup.index(0, 0), "Ada", StoreUI::ParameterRole::Value));
-  Wait();
-  EXPECT_GT(std::exchange(told, 0), 0);
+  WaitUntil([&] { return told > 0; });
+  told = 0;
   EXPECT_EQ(calibration.cannotStart(), "");
   EXPECT_EQ(calibration.start().Name(), "Ok");
   EXPECT_TRUE(calibration.running());
   EXPECT_EQ(calibration.state(), "Looking for the T-pose");
-  Wait();
-  EXPECT_GT(told, 0);
+  WaitUntil([&] { return told > 0; });
   EXPECT_EQ(calibration.acceptTPose().Name(), "Ok");
   EXPECT_EQ(calibration.cancel().Name(), "Ok");
   EXPECT_EQ(calibration.lastResult(), "The last calibration was cancelled.");
 
   // Whoever has started a run, the panel can end it.
-  Wait();
-  EXPECT_EQ(calibration.cannotRecalibrate(), "");
+  WaitUntil([&] { return calibration.cannotRecalibrate().isEmpty(); });
   std::shared_ptr<ISubjectCalibrationController> controller;
   provider->Controller(controller);
   NMX::TCalibrationSessionId session;

@@ -1,10 +1,9 @@
 #include "SubjectStoreUI/WarningGadget.h"
+#include "tests/Support/Eventually.h"
 #include "tests/Support/LogCapture.h"
 #include "tests/Support/ModelFixture.h"
 #include "tests/Support/ModelShadow.h"
 #include "tests/Support/RandomStoreEdits.h"
-
-#include <QElapsedTimer>
 
 #include <gmock/gmock.h>
 
@@ -212,10 +211,8 @@ TEST_F(SubjectModelsTest, ChangesOfAnIntervalCostOneRefresh)
   }
   EXPECT_EQ(eagerShadow.inserts, 3);
   EXPECT_EQ(patient->rowCount(), 0);
-  QElapsedTimer watch;
-  watch.start();
-  while (patient->rowCount() == 0 && watch.elapsed() < 5000)
-    QCoreApplication::processEvents(QEventLoop::AllEvents, 10);
+  EXPECT_TRUE(Eventually([&] { return patient->rowCount() > 0; },
+                         [] { QCoreApplication::processEvents(QEventLoop::AllEvents, 10); }));
   EXPECT_EQ(patient->rowCount(), 3);
   patientShadow.Check();
   Add(ESubjectKind::Props, "D");
@@ -411,9 +408,12 @@ TEST_F(SubjectModelsTest, EditsOfOtherThreadsAreFollowed)
               edits.Transaction(*store);
             --editing;
           });
-    while (editing > 0)
+    const auto follow = [this]
+    {
       if (gui->RunAll() == 0)
         std::this_thread::yield();
+    };
+    EXPECT_TRUE(Eventually([&] { return editing == 0; }, follow, std::chrono::seconds(100)));
   }
   EXPECT_GT(archive.commits, 1000);
   gui->RunAll();

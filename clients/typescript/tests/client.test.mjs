@@ -1,15 +1,14 @@
 // The client against the real host, and against one that misbehaves.
 
 import assert from 'node:assert/strict';
-import { execFile } from 'node:child_process';
 import { readFileSync } from 'node:fs';
 import { describe, test } from 'node:test';
 import { fileURLToPath } from 'node:url';
-import { promisify } from 'node:util';
 
 import * as client from 'subject-store-client';
 
 import { codes } from '../../../tests/EndToEnd/api.mjs';
+import { outputOf } from '../../../tests/EndToEnd/children.mjs';
 import { inTime, startHost, temporaryDirectory, withHost } from '../../../tests/EndToEnd/host.mjs';
 import { apiFiles } from '../../../scripts/api/files.mjs';
 import { hello, withFakeHost } from './fake-host.mjs';
@@ -26,9 +25,9 @@ async function withClient(url, body, options = {}) {
   const one = await SubjectStoreClient.connect(url, { reconnectDelay: quick, onWarning: warning => warnings.push(warning),
                                                       ...options });
   try {
-    await body(one, warnings);
+    await inTime(body(one, warnings), 'the end of a test with a client', 60000, () => warnings);
   } finally {
-    await one.close();
+    await inTime(one.close(), 'the client closes');
   }
   assert.deepEqual(warnings, []);
 }
@@ -185,8 +184,7 @@ describe('against the host, the client', () => {
   test('runs the example of the README', () => withStage(async (_, host) => {
     const example = fileURLToPath(new URL('../example.mjs', import.meta.url));
     assert.ok(file('../README.md').includes(file('../example.mjs').trim()));
-    const { stdout } = await inTime(promisify(execFile)(process.execPath, [example, host.ws]), 'the example ends');
-    assert.match(stdout, /^Crate #ff3366cc *\nBasicObjectServices\.Rename: NotFound: .*\n$/);
+    assert.match(await outputOf(process.execPath, [example, host.ws]), /^Crate #ff3366cc *\nBasicObjectServices\.Rename: NotFound: .*\n$/);
   }));
 });
 

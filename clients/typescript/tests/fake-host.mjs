@@ -2,6 +2,8 @@
 
 import { WebSocketServer } from 'ws';
 
+import { inTime } from '../../../tests/EndToEnd/waiting.mjs';
+
 export const hello = { session: 1, epoch: 'one', api: 'of another', limits: {}, levels: {} };
 
 // Runs `body` with its address. `answer` gets each call and its connection; `greeting`: none when null.
@@ -14,12 +16,12 @@ export async function withFakeHost({ greeting = hello, answer = () => {} }, body
       socket.send(JSON.stringify({ jsonrpc: '2.0', method: 'Server.Hello', params: greeting }));
     socket.on('message', text => answer(JSON.parse(text), socket));
   });
-  await new Promise(done => { server.on('listening', done); });
+  await inTime(new Promise(done => { server.on('listening', done); }), 'the host listens');
   try {
-    await body(`ws://127.0.0.1:${server.address().port}/rpc`, offered);
+    await inTime(body(`ws://127.0.0.1:${server.address().port}/rpc`, offered), 'the end of a test with a host', 60000);
   } finally {
     for (const socket of server.clients)
       socket.terminate();
-    await new Promise(done => { server.close(done); });
+    await inTime(new Promise(done => { server.close(done); }), 'the host ends');
   }
 }

@@ -137,10 +137,10 @@ TEST_F(CalibrationControllerTest, TimeEndsASearchAsAFailureAndACalibrationAsASuc
   EXPECT_TRUE(Perform(StartCalibration).Succeeded());
   EXPECT_TRUE(Perform(AcceptTPose, 2).Succeeded());
   while (controller->Phase() == 2)
-    EXPECT_TRUE(timers->RunOne());
+    ASSERT_TRUE(timers->RunOne());
   EXPECT_EQ(controller->Phase(), 3U);
   while (controller->Phase() == 3)
-    EXPECT_TRUE(timers->RunOne());
+    ASSERT_TRUE(timers->RunOne());
   EXPECT_EQ(controller->LastResult(), IResult(EResult::Ok));
   EXPECT_EQ(Shown(ada), 2);
   postal->RunAll();
@@ -171,7 +171,7 @@ TEST_F(CalibrationControllerTest, WhatTheStoreCannotKeepHasNotHappened)
   EXPECT_TRUE(Perform(AcceptTPose, 1).Succeeded());
   const LogCapture log;
   while (log.messages.empty())
-    EXPECT_TRUE(timers->RunOne());
+    ASSERT_TRUE(timers->RunOne());
   EXPECT_THAT(log.messages, ElementsAre(HasSubstr("DiskFull")));
   EXPECT_EQ(controller->Phase(), 3U);
   archive.full = false;

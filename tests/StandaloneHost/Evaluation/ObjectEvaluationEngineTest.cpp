@@ -2,6 +2,7 @@
 
 #include "StandaloneHost/Evaluation/ConfusionWarnings.h"
 #include "StandaloneHost/Evaluation/EvaluationSettings.h"
+#include "tests/Support/Eventually.h"
 #include "tests/Support/LogCapture.h"
 #include "tests/Support/StoreFixture.h"
 
@@ -92,19 +93,6 @@ protected:
     std::uint64_t required = 0;
     EXPECT_TRUE(engine->Progress(done, required).Succeeded());
     return {done, required};
-  }
-
-  /// Waits until something holds; false when it does not come to that.
-  template <class Condition>
-  static bool Eventually(Condition condition)
-  {
-    for (const auto end = std::chrono::steady_clock::now() + 20s; std::chrono::steady_clock::now() < end;)
-    {
-      if (condition())
-        return true;
-      std::this_thread::sleep_for(1ms);
-    }
-    return condition();
   }
 
   bool EventuallyWarns(Id id, const char* warning) const

@@ -1,4 +1,5 @@
 #include "StandaloneHost/Postal/VGuiPostalService.h"
+#include "tests/Support/Eventually.h"
 #include "tests/Support/LogCapture.h"
 
 #include <QCoreApplication>
@@ -88,8 +89,7 @@ TEST_F(GuiPostalService, RunsTasksOfOtherThreadsOnItsOwn)
                   ++count;
                 });
         });
-  while (count < threads * each)
-    RunEventLoop();
+  EXPECT_TRUE(Eventually([&] { return count >= threads * each; }, RunEventLoop));
   EXPECT_EQ(foreign, 0);
   for (const auto& ofThread : numbers)
     EXPECT_TRUE(ofThread.size() == each && std::is_sorted(ofThread.begin(), ofThread.end()));

@@ -1,5 +1,6 @@
 #include "StandaloneHost/Window/LogFeed.h"
 #include "StandaloneHost/Window/VLogFilterModel.h"
+#include "tests/Support/Eventually.h"
 #include "tests/Support/LogCapture.h"
 
 #include <QAbstractItemModelTester>
@@ -103,8 +104,7 @@ TEST_F(LogModel, TakesMessagesFromManyThreadsEachInItsOrder)
           for (int i = 0; i < each; ++i)
             Log(std::to_string(i), ESeverity::Info, channel);
         });
-  while (model.rowCount() < threads * each)
-    RunEventLoop();
+  EXPECT_TRUE(Eventually([&] { return model.rowCount() >= threads * each; }, RunEventLoop));
   loggers.clear();
   EXPECT_EQ(model.Channels(), QStringList({"Channel 0", "Channel 1", "Channel 2", "Channel 3"}));
   Texts expected;

@@ -14,8 +14,11 @@ QtObject {
     property int openMenus: 0
     readonly property bool asked: openMenus > 0
     readonly property int revision: asked && panel ? panel.revision : 0
-    readonly property var selection: panel ? panel.selection : []
-    readonly property var ids: panel ? panel.selectedSubjects : []
+    /// What was selected when a row's menu opened, while that is open: a command of it is for what the operator has seen
+    /// there. What a client has removed meanwhile makes it fail, and does not let it pass by in silence.
+    property var held: null
+    readonly property var selection: held ? held.selection : panel ? panel.selection : []
+    readonly property var ids: held ? held.ids : panel ? panel.selectedSubjects : []
     readonly property bool any: ids.length > 0
     readonly property var flags: ids.map(id => SubjectStore.subjectFlags(id))
     /// A command passes by what it is not for.
@@ -38,6 +41,17 @@ QtObject {
 
     function has(feature: int): bool {
         return (features & feature) !== 0
+    }
+
+    function hold() {
+        held = {
+            "selection": panel.selection.slice(),
+            "ids": panel.selectedSubjects.slice()
+        }
+    }
+
+    function release() {
+        held = null
     }
 
     /// The selected subjects that have one of these flags.

@@ -17,9 +17,13 @@ PanelMenu {
         actions.dialogs.group.ask(head, name => set(members, name))
     }
 
-    onClosed: --actions.openMenus
+    onClosed: {
+        --actions.openMenus
+        actions.release()
+    }
     onAboutToShow: {
         ++actions.openMenus
+        actions.hold()
         proximity.groups = panel.proximityGroups()
         proximity.current = panel.proximityGroup(subject)
         templates.groups = panel.templateGroups()
