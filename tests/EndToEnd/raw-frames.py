@@ -262,13 +262,16 @@ class RawFrames(unittest.TestCase):
               for code in (1000, 1001, 1002, 1003, 1007, 1011, 3000, 4999)],
             ('the longest reason', 1000, close(1000, b'x' * 123)),
             ('half a code', 1002, frame(CLOSE, b'\x03')),
-            *[(f'code {code}', 1002, close(code)) for code in (0, 999, 1004, 1005, 1006, 1015, 1016, 2999, 5000, 65535)],
-            ('a code that cannot be, with a reason', 1002, close(5000, b'x' * 123)),
+            *[(f'code {code}', 1002, close(code)) for code in (0, 999, 1004, 1005, 1006, 1015, 1016, 2999)],
             # Whatever comes after a goodbye is not looked at.
             ('a call after it', 1000, close(1000) + frame(TEXT, CALL)),
             ('garbage after it', 1000, close(1000) + b'\xff' * 1000),
             ('a second one after it', 1000, close(1000) + close(1001)),
         ])
+        for code in (5000, 65535):  # the library reads these as 1002, whatever the host says
+            with self.subTest(f'code {code}'), Client() as client:
+                client.send(close(code, b'x' * 123))
+                self.assertEqual(client.socket.recv(4), b'\x88\x02\x03\xea')
         with self.subTest('a reason that is not UTF-8'), Client() as client:
             client.send(close(1000, b'\xff\xfe'))
             self.assertIn(client.closed(), (1002, 1007))
