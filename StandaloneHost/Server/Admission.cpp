@@ -98,6 +98,26 @@ bool IsOwnOrigin(std::string_view origin, std::string_view host, bool encrypted)
 
 }
 
+namespace http = boost::beast::http;
+
+Refusal RefusalFor(EAdmission admission)
+{
+  switch (admission)
+  {
+  case EAdmission::NoToken:
+    return {ERefusal::NoToken, http::status::unauthorized,
+            "The token is missing or wrong: send \"Authorization: Bearer TOKEN\".\n"};
+  case EAdmission::WrongOrigin:
+    return {ERefusal::WrongOrigin, http::status::forbidden,
+            "Web pages of this origin may not connect; the host allows them with --allow-origin.\n"};
+  case EAdmission::WrongHost:
+  case EAdmission::Welcome:
+    break;
+  }
+  return {ERefusal::WrongHost, http::status::forbidden,
+          "This host is reached by its address or as localhost, not by that name.\n"};
+}
+
 EAdmission Admit(const Visitor& visitor, const ServerOptions& options)
 {
   if (!options.token.empty() && !visitor.open && !PresentsToken(visitor, options.token))

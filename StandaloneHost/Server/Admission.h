@@ -1,6 +1,11 @@
 #pragma once
 
+#include "StandaloneHost/Server/Refusals.h"
 #include "StandaloneHost/Server/VServer.h"
+
+#include <ostream> // Beast's header of the status needs it, but does not include it
+
+#include <boost/beast/http/status.hpp>
 
 #include <string_view>
 
@@ -24,6 +29,17 @@ enum class EAdmission
   WrongOrigin, ///< a web page from elsewhere
   WrongHost    ///< a name that is not this machine's: a web page whose name was made to point here
 };
+
+/// How a visitor is turned away.
+struct Refusal
+{
+  ERefusal kind;
+  boost::beast::http::status status;
+  std::string_view text; ///< for the visitor
+};
+
+/// For what is not welcome. [any]
+[[nodiscard]] Refusal RefusalFor(EAdmission admission);
 
 /// Decides whether a request is let in. Nothing of the request has been carried out yet. [any]
 [[nodiscard]] EAdmission Admit(const Visitor& visitor, const ServerOptions& options);

@@ -246,8 +246,8 @@ private:
         PostFlush(state, mostPostponed);
     }
 
-    /// While more is read, which happens at once where TLS has more than one record at hand, its answers may go out with
-    /// what has gathered.
+    /// While more is read, which happens at once where TLS has more than one record at hand, its answers may go out
+    /// with what has gathered.
     static void PostFlush(const std::shared_ptr<State>& state, int postpone)
     {
       boost::asio::post(state->client.get_executor(),

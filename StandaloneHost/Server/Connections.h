@@ -87,8 +87,9 @@ public:
   }
 
   /// The connection that is to end first when there is no room for a newcomer; null when none may. As long as strangers
-  /// have more than a small share of the connections, that is the stranger that has been there the longest: so strangers
-  /// only keep out each other. Otherwise the one that has been waiting for its client the longest, a second or more.
+  /// have more than a small share of the connections, that is the stranger that has been there the longest: so
+  /// strangers only keep out each other. Otherwise the one that has been waiting for its client the longest, a second
+  /// or more.
   [[nodiscard]] IConnection* FirstToEnd(Clock::time_point now) const;
 
 private:

@@ -179,19 +179,15 @@ void Dispatcher::Call(const FunctionEntry& entry, const Request& request, Recipi
   {
     if (const auto complaint = OrderByName(arguments, entry.inputs, m_limits, ordered))
       return recipient.Take(
-          request.id,
-          request.id.empty() ? std::string{} : RpcErrorText(request.id, complaint->code, complaint->text),
+          request.id, request.id.empty() ? std::string{} : RpcErrorText(request.id, complaint->code, complaint->text),
           EResult::Failed);
     arguments = ordered;
   }
   // The entry stays until every call has been finished.
-  entry.function->Invoke(arguments,
-                         [id = std::string(request.id), &entry,
-                          recipient = std::move(recipient)](const NMX::IServerReply& finished)
-                         {
-                           recipient.Take(id, id.empty() ? std::string{} : ReplyText(id, entry, finished),
-                                          finished.Result());
-                         });
+  entry.function->Invoke(
+      arguments,
+      [id = std::string(request.id), &entry, recipient = std::move(recipient)](const NMX::IServerReply& finished)
+      { recipient.Take(id, id.empty() ? std::string{} : ReplyText(id, entry, finished), finished.Result()); });
 }
 
 void Dispatcher::CallServer(const Request& request, IListener* listener, const Recipient& recipient)

@@ -2,7 +2,7 @@
 
 #include "HostInterface/NMX/GlobalLog.h"
 #include "StandaloneHost/Server/Admission.h"
-#include "StandaloneHost/Server/HttpHead.h"
+#include "StandaloneHost/Server/HttpOutput.h"
 #include "StandaloneHost/Server/RequestHead.h"
 #include "StandaloneHost/Server/WebSocketSession.h"
 
@@ -16,7 +16,6 @@
 #include <algorithm>
 #include <optional>
 #include <utility>
-#include <vector>
 
 namespace Server
 {
@@ -32,36 +31,10 @@ constexpr std::size_t headerBytes = 16384;
 constexpr std::size_t bodyBufferBytes = 65536; // for reading a body piece by piece
 constexpr std::size_t chunkBytes = 8192;       // read at once of a body whose length is not known
 constexpr std::size_t keptBytes = 4096;        // of the buffer, while the client says nothing
-constexpr std::size_t copiedBytes = 16384;     // a response up to this size is sent in one piece with its head
 constexpr auto handshakeTime = std::chrono::seconds(10);
 constexpr auto idleTime = std::chrono::seconds(60);
 constexpr auto transferTime = std::chrono::seconds(30);
 constexpr auto closingTime = std::chrono::seconds(2);
-
-struct Refusal
-{
-  ERefusal kind;
-  http::status status;
-  std::string_view text; ///< for the visitor
-};
-
-Refusal RefusalFor(EAdmission admission)
-{
-  switch (admission)
-  {
-  case EAdmission::NoToken:
-    return {ERefusal::NoToken, http::status::unauthorized,
-            "The token is missing or wrong: send \"Authorization: Bearer TOKEN\".\n"};
-  case EAdmission::WrongOrigin:
-    return {ERefusal::WrongOrigin, http::status::forbidden,
-            "Web pages of this origin may not connect; the host allows them with --allow-origin.\n"};
-  case EAdmission::WrongHost:
-  case EAdmission::Welcome:
-    break;
-  }
-  return {ERefusal::WrongHost, http::status::forbidden,
-          "This host is reached by its address or as localhost, not by that name.\n"};
-}
 
 class HttpSession final : public IConnection, public std::enable_shared_from_this<HttpSession>
 {
@@ -221,9 +194,9 @@ private:
   [[nodiscard]] EAdmission Admission() const
   {
     const Document* document = m_core->documents.Find(m_head.path);
-    const bool open =
-        m_head.method == http::verb::options ||
-        ((m_head.method == http::verb::get || m_head.method == http::verb::head) && document != nullptr && document->open);
+    const bool open = m_head.method == http::verb::options ||
+                      ((m_head.method == http::verb::get || m_head.method == http::verb::head) && document != nullptr &&
+                       document->open);
     return Admit({m_head.host, m_origin, m_head.authorisation, m_head.webSocketProtocols, open}, m_core->options);
   }
 
@@ -291,7 +264,8 @@ private:
     if (error == http::error::body_limit)
       refuse(http::status::payload_too_large,
              "The message is longer than " + std::to_string(m_core->options.limits.messageBytes) + " bytes.\n");
-    else if (error == http::error::header_limit || (error == http::error::buffer_overflow && !m_parser->is_header_done()))
+    else if (error == http::error::header_limit ||
+             (error == http::error::buffer_overflow && !m_parser->is_header_done()))
       refuse(http::status::request_header_fields_too_large, "The header is too long.\n");
     else if (error == http::error::buffer_overflow)
       refuse(http::status::bad_request, "What stands around the chunks of the body is too long.\n");
@@ -321,7 +295,7 @@ private:
       return RespondWithAllow("GET, HEAD, OPTIONS", "This can only be read.\n");
     m_known = m_known || (!document->open && !m_core->options.token.empty());
     // The document outlives the answer: many who read it slowly take no memory for it.
-    Send(Head(http::status::ok, document->type, {}), *document->text);
+    Send(Output(Head(http::status::ok, document->type, {}), *document->text));
   }
 
   void Call()
@@ -345,12 +319,7 @@ private:
   {
     if (answer.Empty())
       return Respond(http::status::no_content, {}, {});
-    const HttpHead head = Head(http::status::ok, "application/json", {});
-    if (answer.IsPlain() && answer.Size() <= copiedBytes)
-      return Send(head, answer.Own());
-    m_body = std::move(answer);
-    m_reply = HeadText(head, m_body.Size(), 0);
-    SendPieces(m_body.PiecesFrom(0));
+    Send(m_output.Put(Head(http::status::ok, "application/json", {}), std::move(answer)));
   }
 
   void RespondWithAllow(std::string_view methods, std::string_view text)
@@ -364,7 +333,13 @@ private:
   {
     if (status == http::status::unauthorized)
       fields = "WWW-Authenticate: Bearer\r\n";
-    Send(Head(status, type, fields), body);
+    Send(Output(Head(status, type, fields), body));
+  }
+
+  /// Who asks for the head alone is told how long the body would be.
+  [[nodiscard]] HttpOutput::Buffers Output(const HttpHead& head, std::string_view body)
+  {
+    return m_head.method == http::verb::head ? m_output.PutHead(head, body.size()) : m_output.Put(head, body);
   }
 
   [[nodiscard]] HttpHead Head(http::status status, std::string_view type, std::string_view fields)
@@ -373,38 +348,21 @@ private:
     return {status, fields, type, m_origin, m_keepAlive, m_oldVersion};
   }
 
-  /// Sends a head, and a body of which a copy is sent if it is short; otherwise it stays where it is until then.
-  void Send(const HttpHead& head, std::string_view body)
-  {
-    const bool copied = body.size() <= copiedBytes;
-    const bool told = m_head.method != http::verb::head; // who asks for the head alone is told the length only
-    m_reply = HeadText(head, body.size(), copied && told ? body.size() : 0);
-    if (copied && told)
-      m_reply += body;
-    SendPieces(copied || !told ? std::vector<std::string_view>{} : std::vector{body});
-  }
-
-  /// Sends the reply, and after it what stays where it is.
-  void SendPieces(const std::vector<std::string_view>& pieces)
+  void Send(HttpOutput::Buffers buffers)
   {
     AwaitClient(transferTime);
-    m_held.Set(m_reply.size() + m_body.OwnBytes());
     const auto sent = [self = shared_from_this()](error_code error, std::size_t) { self->OnSent(error); };
-    if (pieces.empty())
-      return boost::asio::async_write(m_stream, boost::asio::buffer(m_reply), sent);
-    std::vector<boost::asio::const_buffer> buffers{boost::asio::buffer(m_reply)};
-    for (const std::string_view piece : pieces)
-      buffers.emplace_back(piece.data(), piece.size());
-    boost::asio::async_write(m_stream, std::move(buffers), sent);
+    if (buffers.size() == 1)
+      boost::asio::async_write(m_stream, boost::asio::buffer(buffers.front()), sent);
+    else
+      boost::asio::async_write(m_stream, std::move(buffers), sent);
   }
 
   void OnSent(error_code error)
   {
     if (error)
       return Abort();
-    std::string().swap(m_reply);
-    m_body = {};
-    m_held.Set(0);
+    m_output.Clear();
     if (m_keepAlive)
       return Read();
     // The rest of what the client sends is read and dropped for a while: to close on it would take back the answer.
@@ -418,9 +376,7 @@ private:
   boost::beast::flat_buffer m_buffer;
   std::optional<http::request_parser<http::string_body>> m_parser;
   RequestHead m_head; // looks into what the parser has
-  std::string m_reply;
-  ResponseText m_body; // what follows the reply
-  HeldBytes m_held{m_core->outgoing};
+  HttpOutput m_output{m_core->outgoing};
   std::string m_origin;
   const Clock::time_point m_began = Clock::now();
   Clock::time_point m_deadline = Clock::time_point::max();

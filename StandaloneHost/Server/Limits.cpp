@@ -25,7 +25,7 @@ constexpr LimitRow rows[] = {
      "Calls of all connections at the same time; more wait."},
     {&Limits::outgoingBytes, "outgoingBytes", "max-outgoing-bytes", mebi, 4096 * mebi,
      "Bytes that wait for the client to read them; also the longest response."},
-    {&Limits::outgoingBytesOverall, "outgoingBytesOverall", "max-outgoing-bytes-overall", mebi, mebi * mebi,
+    {&Limits::outgoingBytesOverall, "outgoingBytesOverall", "max-outgoing-bytes-overall", mebi, mebi* mebi,
      "Bytes that wait for all clients together; beyond, each has its share only."},
     {&Limits::outgoingNotifications, "outgoingNotifications", "max-outgoing-notifications", 1, mebi,
      "Notifications that wait for the client to read them and may not stand for each other."},

@@ -22,7 +22,8 @@ bool OutgoingQueue::Push(SharedMessage message, EPolicy policy, const void* call
 {
   if (policy == EPolicy::Change && m_changes != 0)
   {
-    const auto earlier = std::find_if(m_waiting.begin(), m_waiting.end(), [callback](const Waiting& waiting)
+    const auto earlier = std::find_if(m_waiting.begin(), m_waiting.end(),
+                                      [callback](const Waiting& waiting)
                                       { return waiting.policy == EPolicy::Change && waiting.callback == callback; });
     if (earlier != m_waiting.end())
     {

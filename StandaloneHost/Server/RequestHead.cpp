@@ -51,7 +51,8 @@ Error ReadTarget(std::string_view target, RequestHead& head)
   else
   {
     const std::size_t colon = target.find("://");
-    if (colon == target.npos || !(SameText(target.substr(0, colon), "http") || SameText(target.substr(0, colon), "https")))
+    if (colon == target.npos ||
+        !(SameText(target.substr(0, colon), "http") || SameText(target.substr(0, colon), "https")))
       return Bad("The target is neither a path nor an address.\n");
     // The address counts, whatever the header Host says.
     const std::string_view rest = target.substr(colon + 3);

@@ -15,7 +15,8 @@ namespace Server
 /// What is wrong with the protocol, or with what it is to carry: `error` with `code` and `message`.
 [[nodiscard]] std::string RpcErrorText(std::string_view id, int code, std::string_view message);
 
-/// A call that failed: its code as the wire has it, what the code means for its function, and what more there is to say.
+/// A call that failed: its code as the wire has it, what the code means for its function, and what more there is to
+/// say.
 [[nodiscard]] std::string FailureText(std::string_view id, NMX::IResult result, std::string_view meaning,
                                       std::string_view detail);
 

@@ -37,9 +37,9 @@ constexpr auto tick = std::chrono::milliseconds(500);
 constexpr auto closingTick = std::chrono::milliseconds(10);
 constexpr auto closingTime = std::chrono::milliseconds(1500);
 constexpr auto acceptPause = std::chrono::milliseconds(100);
-constexpr auto standstill = 4 * tick;      // so late, and the process has not run meanwhile
-constexpr std::size_t refusedAtOnce = 64;  // connections beyond the limit that are told so
-constexpr rlim_t otherFiles = 256;         // what the host needs besides connections
+constexpr auto standstill = 4 * tick;     // so late, and the process has not run meanwhile
+constexpr std::size_t refusedAtOnce = 64; // connections beyond the limit that are told so
+constexpr rlim_t otherFiles = 256;        // what the host needs besides connections
 
 /// Lets the process have as many open files as it has connections, if the system allows it.
 void AllowOpenFiles(std::size_t connections)
@@ -93,13 +93,12 @@ struct VServer::State : std::enable_shared_from_this<State>
 
   void Accept()
   {
-    acceptor.async_accept(
-        peer,
-        [weak = weak_from_this()](error_code error, Socket socket)
-        {
-          if (const auto self = weak.lock(); self && self->acceptor.is_open())
-            self->OnAccepted(error, std::move(socket));
-        });
+    acceptor.async_accept(peer,
+                          [weak = weak_from_this()](error_code error, Socket socket)
+                          {
+                            if (const auto self = weak.lock(); self && self->acceptor.is_open())
+                              self->OnAccepted(error, std::move(socket));
+                          });
   }
 
   void OnAccepted(error_code error, Socket socket)
@@ -126,8 +125,8 @@ struct VServer::State : std::enable_shared_from_this<State>
   void OnNotAccepted(error_code error)
   {
     core->refusals.Note(ERefusal::NotAccepted, {}, error.message());
-    const bool tooMany = error == asio::error::no_descriptors ||
-                         error == boost::system::errc::too_many_files_open_in_system;
+    const bool tooMany =
+        error == asio::error::no_descriptors || error == boost::system::errc::too_many_files_open_in_system;
     if (tooMany && MakeRoom())
       return Accept();
     if (tooMany && spare)

@@ -156,7 +156,8 @@ private:
     m_open = true;
     m_deadline = Clock::time_point::max();
     m_lastSign = Clock::now();
-    Send(std::make_shared<const ResponseText>(m_core->dispatcher.Hello(++m_core->lastSession)), EPolicy::Reply, nullptr);
+    Send(std::make_shared<const ResponseText>(m_core->dispatcher.Hello(++m_core->lastSession)), EPolicy::Reply,
+         nullptr);
     if (m_core->closing)
       return Close();
     Read();
@@ -213,7 +214,8 @@ private:
     try
     {
       Count(static_cast<std::ptrdiff_t>(
-          m_core->dispatcher.Handle(text, this, [self = shared_from_this()](ResponseText answer, std::size_t calls)
+          m_core->dispatcher.Handle(text, this,
+                                    [self = shared_from_this()](ResponseText answer, std::size_t calls)
                                     { self->OnAnswer(std::move(answer), calls); })));
     }
     catch (const std::exception& failure)

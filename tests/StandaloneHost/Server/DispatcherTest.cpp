@@ -80,8 +80,9 @@ TEST_F(DispatcherTest, AnAnswerThatIsTooLongLosesItsOutputsAndEndsItsBatch)
   EXPECT_EQ(Codes(Call("4000")), "-32000/2 ");
   EXPECT_EQ(Codes('[' + Call("3300") + ',' + Call("200") + ',' + Call("100") + ']'), "2 2 2 ");
   carriedOut = 0;
-  EXPECT_EQ(Codes('[' + Call("2000") + ',' + Call("0") + ',' + Call("2000") + ',' + Call("1") + ',' + Call("1", "") + ",7]"),
-            "2 -2147483638/2147483658 -32000/2 -32000 -32600 ");
+  EXPECT_EQ(
+      Codes('[' + Call("2000") + ',' + Call("0") + ',' + Call("2000") + ',' + Call("1") + ',' + Call("1", "") + ",7]"),
+      "2 -2147483638/2147483658 -32000/2 -32000 -32600 ");
   EXPECT_EQ(carriedOut, 3) << "what comes behind, answered or not, is not carried out";
   EXPECT_EQ(outgoing->Total(), 0U);
 }

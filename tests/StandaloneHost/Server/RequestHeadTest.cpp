@@ -12,8 +12,8 @@ namespace
 
 constexpr std::string_view host = "Host: stage:1\r\n";
 
-/// What a head comes to: "METHOD path host" with "+body" and "+continue", or the status with which it is refused; 0 when
-/// the parser does not take it in the first place.
+/// What a head comes to: "METHOD path host" with "+body" and "+continue", or the status with which it is refused; 0
+/// when the parser does not take it in the first place.
 std::string Outcome(std::string_view line, std::string_view fields)
 {
   const std::string text = std::string(line) + "\r\n" + std::string(fields) + "\r\n";
@@ -75,7 +75,8 @@ TEST(RequestHead, IsReadInOneWayOrRefused)
       {"GET / HTTP/1.1", one + "Content-Length: 00\r\n", "GET / stage:1"},
       {"HEAD / HTTP/1.1", one + "Transfer-Encoding: chunked\r\n", "400"},
       {"OPTIONS * HTTP/1.1", one + "Transfer-Encoding: chunked\r\n", "400"},
-      {"POST /rpc HTTP/1.1", one + "Expect: 100-Continue\r\nContent-Length: 5\r\n", "POST /rpc stage:1 +body +continue"},
+      {"POST /rpc HTTP/1.1", one + "Expect: 100-Continue\r\nContent-Length: 5\r\n",
+       "POST /rpc stage:1 +body +continue"},
       {"POST /rpc HTTP/1.1", one + "Expect: 100-continue\r\n", "POST /rpc stage:1"},
       {"POST /rpc HTTP/1.1", one + "Expect: miracles\r\n", "417"},
       {"POST /rpc HTTP/1.0", one + "Expect: miracles\r\n", "POST /rpc stage:1"},
@@ -88,12 +89,12 @@ TEST(RequestHead, IsReadInOneWayOrRefused)
 
 TEST(RequestHead, TellsOneLengthOnly)
 {
-  for (const std::string lengths : {"Content-Length: 5\r\nContent-Length: 5\r\n", "Content-Length: 5\r\nContent-Length: 6\r\n",
-                                    "Content-Length: 5, 5\r\n", "Content-Length: +5\r\n", "Content-Length: -0\r\n",
-                                    "Content-Length: 0x5\r\n", "Content-Length: \r\n", "Transfer-Encoding: x, chunked, x\r\n",
-                                    "Content-Length: 5\r\nTransfer-Encoding: chunked\r\n",
-                                    "Transfer-Encoding: chunked\r\nContent-Length: 5\r\n",
-                                    "Transfer-Encoding: chunked\r\nTransfer-Encoding: chunked\r\n"})
+  for (const std::string lengths :
+       {"Content-Length: 5\r\nContent-Length: 5\r\n", "Content-Length: 5\r\nContent-Length: 6\r\n",
+        "Content-Length: 5, 5\r\n", "Content-Length: +5\r\n", "Content-Length: -0\r\n", "Content-Length: 0x5\r\n",
+        "Content-Length: \r\n", "Transfer-Encoding: x, chunked, x\r\n",
+        "Content-Length: 5\r\nTransfer-Encoding: chunked\r\n", "Transfer-Encoding: chunked\r\nContent-Length: 5\r\n",
+        "Transfer-Encoding: chunked\r\nTransfer-Encoding: chunked\r\n"})
   {
     const std::string outcome = Outcome("POST /rpc HTTP/1.1", std::string(host) + lengths);
     EXPECT_TRUE(outcome == "0" || outcome == "400" || outcome == "501") << lengths << outcome;
