@@ -139,8 +139,8 @@ function assertNoSanitizerReport(stderr) {
 }
 
 // Runs the host with options that keep it from starting.
-export async function refusedStart(options, environment) {
-  const process = launch(options, environment);
+export async function refusedStart(options, environment, launcher) {
+  const process = launch(options, environment, launcher);
   try {
     const { status, signal } = await inTime(Promise.race([process.ended, process.listening]),
                                             `${options.join(' ')} ends the host`, 10000);
@@ -155,8 +155,9 @@ class Host {
   #process;
   #killed = false;
 
-  constructor(process, { url, ws }) {
+  constructor(process, { url, ws }, readyFile) {
     this.#process = process;
+    this.readyFile = readyFile;
     this.url = url;
     this.ws = ws;
     this.port = Number(new URL(url).port);
@@ -215,7 +216,7 @@ export async function startHost({ subjects, devices, config, data = ':memory:', 
   // The file appears whole: no second look.
   const ready = JSON.parse(readFileSync(readyFile, 'utf8'));
   assert.equal(ready.pid, process.child.pid);
-  return new Host(process, ready);
+  return new Host(process, ready, readyFile);
 }
 
 // Runs `body` with a host, which has to end well afterwards.
