@@ -5,9 +5,11 @@
 #include "StandaloneHost/Logging/LineQueue.h"
 
 #include <condition_variable>
+#include <fcntl.h>
 #include <mutex>
 #include <string>
 #include <thread>
+#include <unistd.h>
 #include <utility>
 
 namespace Logging
@@ -35,7 +37,10 @@ std::string TextOf(const LineQueue::Entry& entry)
 
 struct LogWriter::State
 {
-  explicit State(int toDescriptor) : descriptor(toDescriptor) {}
+  explicit State(int original) : descriptor(fcntl(original, F_DUPFD_CLOEXEC, 0)) {}
+  State(const State&) = delete;
+  State& operator=(const State&) = delete;
+  ~State() { close(descriptor); }
 
   void Take(const NMX::LogRecord& record) noexcept;
   void ReportHeldBack(Clock::time_point now, bool all = false) noexcept;
@@ -47,7 +52,7 @@ struct LogWriter::State
   void Run();
   bool Write(const LineQueue::Entry& entry) noexcept;
 
-  const int descriptor;
+  const int descriptor;    // its own: a thread that is left behind must not meet another file of that number
   bool lineBroken = false; ///< only the beginning of the latest line was written; of the writing thread
   std::mutex mutex;        // for all that follows
   std::condition_variable wake;
