@@ -2,11 +2,11 @@
 
 import assert from 'node:assert/strict';
 import { existsSync, readFileSync, renameSync, symlinkSync, writeFileSync } from 'node:fs';
-import { dirname, join, relative } from 'node:path';
+import { join, relative } from 'node:path';
 import { describe, test } from 'node:test';
 
 import { assertSucceeds } from './api.mjs';
-import { binary, configuration, refusedStart, temporaryDirectory, temporaryFile, withHost } from './host.mjs';
+import { configuration, refusedStart, temporaryDirectory, temporaryFile, withHost } from './host.mjs';
 import { Connection, post, request, upgradeStatus } from './wire.mjs';
 
 const subjects = [{ name: 'Crate' }];
@@ -78,7 +78,6 @@ test('A ready file that would replace a file of the host is refused, and that fi
   const config = temporaryFile('stage.xml', good);
   const configLink = join(link, '../stage.xml');
   symlinkSync(config, configLink);
-  const plugin = join(dirname(binary), '../lib/RunaCorePluginSubjectStore.so');
   const [certificate, key] = ['cert', 'key'].map(name => temporaryFile(name, 'PEM'));
   const encrypted = ['--tls-cert', certificate, '--tls-key', key];
   const bytes = readFileSync(join(data, 'store.sqlite'));
@@ -87,7 +86,7 @@ test('A ready file that would replace a file of the host is refused, and that fi
       .map(name => [join(data, name)]),
     [join(link, 'store.sqlite')], [storeLink], [join(data, 'none/../store.sqlite')],
     [relative(process.cwd(), join(data, 'store.sqlite'))], [configLink, ['--config', config]],
-    [token, ['--token-file', token]], [certificate, encrypted], [key, encrypted], [plugin],
+    [token, ['--token-file', token]], [certificate, encrypted], [key, encrypted],
     [noPlugin, ['--plugin-file', noPlugin]],
   ])
     assertRefused(await refusedStart([...listen, '--data', data, '--ready-file', file, ...options]),
