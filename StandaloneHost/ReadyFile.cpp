@@ -79,15 +79,18 @@ ReadyFile::ReadyFile(const fs::path& file, std::string_view text)
     throw std::runtime_error("cannot write the ready file \"" + file.string() + "\": its folder is not there");
   try
   {
-    Files::WriteWholeFile(file, text, [](const fs::path&) {});
+    // Another file may come in its place as soon as it is there.
+    Files::WriteWholeFile(file, text,
+                          [this](const fs::path& unfinished)
+                          { m_descriptor = open(unfinished.c_str(), O_PATH | O_CLOEXEC); });
   }
   catch (const Files::ConfigurationError& failure)
   {
+    if (m_descriptor >= 0)
+      close(m_descriptor);
     throw std::runtime_error("cannot write the ready file: " + std::string(failure.what()));
   }
-  m_target = fs::canonical(file, error);
-  if (!error)
-    m_descriptor = open(m_target.c_str(), O_PATH | O_CLOEXEC);
+  m_target = Resolved(file);
 }
 
 ReadyFile::~ReadyFile()
