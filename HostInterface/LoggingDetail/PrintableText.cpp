@@ -4,7 +4,9 @@
 
 #include <algorithm>
 #include <array>
-#include <cstdint>
+#include <clocale>
+#include <cstdio>
+#include <cwchar>
 
 namespace LoggingDetail
 {
@@ -12,34 +14,20 @@ namespace LoggingDetail
 namespace
 {
 
-using Utf8 = boost::locale::utf::utf_traits<char>;
-using boost::locale::utf::code_point;
-
 bool IsPlain(char c)
 {
-  return c >= ' ' && c <= '~' && c != '\\';
+  return c >= ' ' && c <= '~';
 }
 
-struct Range
+/// Characters without a shape that turn, join or part what stands around them.
+bool IsInvisible(std::uint32_t character)
 {
-  code_point first, last;
-};
-
-/// Characters that nobody sees and that change what is seen, and those that end a line outside of ASCII.
-constexpr std::array unprintable{
-    Range{0x00, 0x1F},     Range{'\\', '\\'},     Range{0x7F, 0x9F},     Range{0x61C, 0x61C},
-    Range{0x200E, 0x200F}, Range{0x2028, 0x202E}, Range{0x2066, 0x2069},
-};
-
-std::string Hexadecimal(const char* begin, std::uint32_t number, int digits)
-{
-  std::string text = begin;
-  for (int shift = 4 * (digits - 1); shift >= 0; shift -= 4)
-    text += "0123456789abcdef"[(number >> shift) & 0xF];
-  return text;
+  return (character >= 0x200B && character <= 0x200F) || (character >= 0x2028 && character <= 0x202E) ||
+         (character >= 0x2060 && character <= 0x206F) || character == 0xFEFF || character == 0xAD ||
+         character == 0x61C || (character >= 0xE0000 && character <= 0xE0FFF);
 }
 
-std::string Escaped(code_point character)
+std::string Escape(std::uint32_t character, char byte)
 {
   switch (character)
   {
@@ -49,30 +37,49 @@ std::string Escaped(code_point character)
     return "\\r";
   case '\t':
     return "\\t";
-  case '\\':
-    return "\\\\";
   default:
-    return character < 0x80 ? Hexadecimal("\\x", character, 2) : Hexadecimal("\\u", character, 4);
+    break;
   }
+  std::array<char, 16> text{};
+  if (character == notUtf8 || character < 0x80)
+    std::snprintf(text.data(), text.size(), "\\x%02x", static_cast<unsigned>(static_cast<unsigned char>(byte)));
+  else
+    std::snprintf(text.data(), text.size(), "\\u{%x}", static_cast<unsigned>(character));
+  return text.data();
 }
 
-/// The next character as it is shown; moves on `text`.
+/// The next character as it is shown; taken off the text.
 std::string NextCharacter(std::string_view& text)
 {
-  const char* end = text.data();
-  const code_point character = Utf8::decode(end, text.data() + text.size());
-  if (character == boost::locale::utf::illegal || character == boost::locale::utf::incomplete)
-  {
-    const auto byte = static_cast<unsigned char>(text.front());
-    text.remove_prefix(1);
-    return Hexadecimal("\\x", byte, 2);
-  }
-  const std::string_view bytes = text.substr(0, static_cast<std::size_t>(end - text.data()));
-  text.remove_prefix(bytes.size());
-  const auto holds = [&](const Range& range) { return character >= range.first && character <= range.last; };
-  return std::any_of(unprintable.begin(), unprintable.end(), holds) ? Escaped(character) : std::string(bytes);
+  const std::string_view before = text;
+  const std::uint32_t character = TakeCharacter(text);
+  if (character == notUtf8 || IsInvisible(character) || ColumnsOf(character) < 0 || character < 0x20)
+    return Escape(character, before.front());
+  return std::string(before.substr(0, before.size() - text.size()));
 }
 
+}
+
+std::uint32_t TakeCharacter(std::string_view& text)
+{
+  namespace utf = boost::locale::utf;
+  const char* position = text.data();
+  const utf::code_point character = utf::utf_traits<char>::decode(position, text.data() + text.size());
+  const bool good = utf::is_valid_codepoint(character);
+  text.remove_prefix(good ? static_cast<std::size_t>(position - text.data()) : 1);
+  return good ? character : notUtf8;
+}
+
+/// Whatever locale the user has: the program's texts are UTF-8.
+int ColumnsOf(std::uint32_t character)
+{
+  static const locale_t locale = newlocale(LC_CTYPE_MASK, "C.UTF-8", nullptr);
+  if (locale == nullptr || character == notUtf8)
+    return character >= 0x20 && character < 0x7F ? 1 : -1;
+  const locale_t before = uselocale(locale);
+  const int width = wcwidth(static_cast<wchar_t>(character));
+  uselocale(before);
+  return width;
 }
 
 std::string PrintableText(std::string_view text, std::size_t longest)

@@ -54,7 +54,7 @@ const std::map<std::string, std::set<std::string>> allowed{
     {"StandaloneHost/Page", {}},
     {"StandaloneHost/Server", {"StandaloneHost/Page", "HostInterface"}},
     {"StandaloneHost/Simulation", {"HostInterface", "StoreInterface"}},
-    {"StandaloneHost/CommandLine", {"StandaloneHost/Server"}},
+    {"StandaloneHost/CommandLine", {"StandaloneHost/Server", "HostInterface"}},
     {"StandaloneHost/Window", {"StandaloneHost/Logging", "StandaloneHost/Server", "HostInterface"}},
     {"StandaloneHost/Files", {"StandaloneHost/Store", "HostInterface", "StoreInterface"}},
     {"StandaloneHost/Settings", {"StandaloneHost/Store", "HostInterface", "StoreInterface"}},

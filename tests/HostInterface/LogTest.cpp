@@ -68,14 +68,14 @@ TEST(Log, ShowsATextSoThatItCannotActOnTheTerminal)
     std::string_view text, shown;
   } cases[]{
       {"", ""},
-      {"plain, größer, 日本, 🎬", "plain, größer, 日本, 🎬"},
-      {"a\nb\tc\rd\\n", "a\\nb\\tc\\rd\\\\n"},
+      {"plain \\, größer, 箱, 🎭", "plain \\, größer, 箱, 🎭"},
+      {"a\nb\tc\rd", "a\\nb\\tc\\rd"},
       {std::string_view("\0\x1b[2J\x7f", 6), "\\x00\\x1b[2J\\x7f"},
-      {"\u0080 \u009b31m \u009f \u00a0", "\\u0080 \\u009b31m \\u009f \u00a0"},
-      {"\u202a\u202e \u2066\u2069 \u200e\u061c", "\\u202a\\u202e \\u2066\\u2069 \\u200e\\u061c"},
-      {"\u2028\u2029", "\\u2028\\u2029"},
+      {"\u0080 \u009b31m \u009f \u00a0", "\\u{80} \\u{9b}31m \\u{9f} \u00a0"},
+      {"\u202a\u202e \u2066\u2069 \u200b\u061c", "\\u{202a}\\u{202e} \\u{2066}\\u{2069} \\u{200b}\\u{61c}"},
+      {"\u2028\u2029", "\\u{2028}\\u{2029}"},
       {"\x9b x \xff", "\\x9b x \\xff"},                        // bytes that begin nothing
-      {"\xc3", "\\xc3"},                                       // the end of the text in a character
+      {"a\xc3", "a\\xc3"},                                     // the end of the text in a character
       {"\xe2\x82z \xc3(", "\\xe2\\x82z \\xc3("},               // another character in one
       {"\xc0\xaf \xed\xa0\x80", "\\xc0\\xaf \\xed\\xa0\\x80"}, // overlong; half of a pair
   };

@@ -157,7 +157,7 @@ TEST_F(LogModel, IsFedByTheWriterOfTheLogWithWhatItWrites)
   ASSERT_GT(model.rowCount(), 100);
   EXPECT_LT(model.rowCount(), 1000);
   const std::string first = TextsOf(model).front();
-  EXPECT_TRUE(first.starts_with("both\\u202exxx")) << first.substr(0, 20);
+  EXPECT_TRUE(first.starts_with("both\\u{202e}xxx")) << first.substr(0, 20);
   EXPECT_LT(first.size(), 3000U);
   EXPECT_NE(TextsOf(model).back(), "one");
 }
