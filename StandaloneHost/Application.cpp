@@ -7,9 +7,8 @@
 #include "StandaloneHost/Characters/VCharacterControls.h"
 #include "StandaloneHost/Evaluation/VObjectEvaluationEngine.h"
 #include "StandaloneHost/FileIO/VRunaCoreFileIO.h"
-#include "StandaloneHost/Files/ConfigurationError.h"
 #include "StandaloneHost/Files/SubjectConfiguration.h"
-#include "StandaloneHost/Files/WholeFile.h"
+#include "StandaloneHost/Logging/LogWriter.h"
 #include "StandaloneHost/Panel/VObjectPresetProvider.h"
 #include "StandaloneHost/Panel/VOfflineStoreServices.h"
 #include "StandaloneHost/Panel/VPanelServices.h"
@@ -17,6 +16,7 @@
 #include "StandaloneHost/PluginModule.h"
 #include "StandaloneHost/Postal/VAsioPostalService.h"
 #include "StandaloneHost/Postal/VGuiPostalService.h"
+#include "StandaloneHost/ReadyFile.h"
 #include "StandaloneHost/Server/VServer.h"
 #include "StandaloneHost/Settings/PanelSettings.h"
 #include "StandaloneHost/Simulation/HostSimulation.h"
@@ -32,9 +32,7 @@
 #include "StandaloneHost/Window/LogFeed.h"
 #include "StandaloneHost/Window/VWindow.h"
 
-#include <cstdio>
 #include <optional>
-#include <stdexcept>
 #include <string>
 #include <system_error>
 #include <unistd.h>
@@ -88,24 +86,10 @@ public:
   [[nodiscard]] bool Granted(std::uint32_t /*right*/) const override { return true; }
 };
 
-/// Tells whoever started the host that calls are served. The file appears whole.
-void WriteReadyFile(const std::filesystem::path& file, const Server::VServer& server)
+std::string ReadyText(const Server::VServer& server)
 {
-  if (file.empty())
-    return;
-  std::error_code error;
-  if (file.has_parent_path() && !std::filesystem::is_directory(file.parent_path(), error))
-    throw std::runtime_error("cannot write the ready file \"" + file.string() + "\": its folder is not there");
-  const std::string text = "{\"url\": \"" + server.Url() + "\", \"ws\": \"" + server.WebSocketUrl() +
-                           "\", \"pid\": " + std::to_string(getpid()) + "}\n";
-  try
-  {
-    Files::WriteWholeFile(file, text, [](const std::filesystem::path&) {});
-  }
-  catch (const Files::ConfigurationError& failure)
-  {
-    throw std::runtime_error("cannot write the ready file: " + std::string(failure.what()));
-  }
+  return "{\"url\": \"" + server.Url() + "\", \"ws\": \"" + server.WebSocketUrl() +
+         "\", \"pid\": " + std::to_string(getpid()) + "}\n";
 }
 
 /// Object evaluation, if the feature is switched on.
@@ -207,12 +191,12 @@ void RegisterWith(Window::VWindow& window, RunaCorePluginInterface::IPlugin& plu
   (void)plugin.RegisterUserInterface(host, window);
 }
 
-/// Tells whoever started the host that calls are served.
-void AnnounceAddress(const Options& options, const Server::VServer& server)
+/// For people, who need not read it.
+void PrintAddress(const Server::VServer& server)
 {
-  WriteReadyFile(options.readyFile, server);
-  std::printf("listening on %s and %s\n", server.Url().c_str(), server.WebSocketUrl().c_str());
-  std::fflush(stdout);
+  const std::string line = "listening on " + server.Url() + " and " + server.WebSocketUrl() + '\n';
+  if (!Logging::WriteWithin(STDOUT_FILENO, line, Logging::patience))
+    NMX::Log(NMX::systemLog, NMX::ESeverity::Notice, "Nobody takes what is written to standard output.");
 }
 
 /// Registers everything, opens the server and runs until somebody ends the program.
@@ -238,7 +222,8 @@ void Run(Parts& parts, const Options& options, Window::VLogModel* log)
     parts.window->Show(
         *parts.server, [&plugin = *parts.plugin] { return plugin.CanClose(); },
         [store = parts.store] { return store->Fault(); });
-  AnnounceAddress(options, *parts.server);
+  const ReadyFile readyFile(options.readyFile, ReadyText(*parts.server));
+  PrintAddress(*parts.server);
   QCoreApplication::exec();
 }
 
@@ -247,12 +232,13 @@ void Run(Parts& parts, const Options& options, Window::VLogModel* log)
 void RunApplication(const Options& options)
 {
   const bool withWindow = !options.headless && Window::HasDisplay();
+  Logging::LogWriter logWriter(STDERR_FILENO);
   const auto eventLoop = Window::MakeEventLoop(withWindow);
   const StopSignals signals;
   Window::VLogModel log;
   std::optional<Window::LogFeed> logFeed;
   if (withWindow)
-    logFeed.emplace(log);
+    logFeed.emplace(logWriter, log);
   Parts parts = MakeParts(options);
   try
   {

@@ -1,12 +1,12 @@
 #include "StandaloneHost/Options.h"
 
+#include "StandaloneHost/ReadyFile.h"
 #include "StandaloneHost/Server/TokenFile.h"
 
 #include <boost/asio/ip/address.hpp>
 #include <boost/program_options.hpp>
 #include <boost/regex.hpp>
 
-#include <array>
 #include <cctype>
 #include <charconv>
 #include <cstdlib>
@@ -41,10 +41,8 @@ Number ParseNumber(std::string_view text, std::string_view option)
 
 NMX::ESeverity ParseLogLevel(const std::string& text)
 {
-  static constexpr std::array<std::string_view, 8> names{"fatal",  "critical", "error", "warning",
-                                                         "notice", "info",     "debug", "trace"};
-  for (std::size_t level = 0; level < names.size(); ++level)
-    if (text == names[level] || text == std::to_string(level))
+  for (int level = static_cast<int>(NMX::ESeverity::Fatal); level <= static_cast<int>(NMX::ESeverity::Trace); ++level)
+    if (text == NMX::SeverityName(static_cast<NMX::ESeverity>(level)) || text == std::to_string(level))
       return static_cast<NMX::ESeverity>(level);
   throw OptionError("--log: expected error, warning, notice, info, debug or trace, got " + Quoted(text));
 }
@@ -168,7 +166,7 @@ po::options_description Description()
       ("subject-calibration-time", text("10000"),
        "how long a subject calibration goes on after the T-pose, in ms")                           //
       ("headless", "no window; also the case when there is no display")                            //
-      ("ready-file", po::value<std::string>(), "file to write once calls are served")              //
+      ("ready-file", po::value<std::string>(), "file that is there while calls are served")              //
       ("plugin-file", po::value<std::string>(), "plugin module to load (default: the host's own)") //
       ("log", text("notice"), "error, warning, notice, info, debug or trace");
   AddLimits(description);
@@ -244,5 +242,6 @@ Request ReadOptions(int argumentCount, const char* const* arguments)
   options.readyFile = given("ready-file");
   options.pluginFile = given("plugin-file");
   options.logLevel = ParseLogLevel(given("log"));
+  CheckReadyFile(options, given("token-file"));
   return request;
 }

@@ -1,5 +1,8 @@
 #include "HostInterface/NMX/GlobalLog.h"
 
+#include "HostInterface/LoggingDetail/PrintableText.h"
+
+#include <algorithm>
 #include <array>
 #include <cstdio>
 #include <mutex>
@@ -13,13 +16,15 @@ namespace
 
 std::atomic<int> level{static_cast<int>(ESeverity::Notice)};
 
+constexpr std::size_t longestText = 4096;
+
+/// For programs that set no sink. Whoever reads standard error can hold it up.
 void WriteToStandardError(const LogRecord& record)
 {
-  static constexpr std::array<const char*, 8> names{"fatal",  "critical", "error", "warning",
-                                                    "notice", "info",     "debug", "trace"};
-  std::fprintf(stderr, "%s [%.*s] %.*s\n", names[static_cast<std::size_t>(record.severity)],
-               static_cast<int>(record.channel.size()), record.channel.data(), static_cast<int>(record.text.size()),
-               record.text.data());
+  std::string line(SeverityName(record.severity));
+  line.append(" [").append(record.channel).append("] ");
+  line.append(LoggingDetail::PrintableText(record.text, longestText)).append("\n");
+  std::fputs(line.c_str(), stderr);
 }
 
 std::mutex& SinkMutex()
@@ -34,6 +39,13 @@ GlobalLog::Sink& CurrentSink()
   return sink;
 }
 
+}
+
+std::string_view SeverityName(ESeverity severity)
+{
+  static constexpr std::array<std::string_view, 8> names{"fatal",  "critical", "error", "warning",
+                                                         "notice", "info",     "debug", "trace"};
+  return names[std::min(static_cast<std::size_t>(severity), names.size() - 1)];
 }
 
 GlobalLog::Sink GlobalLog::SetSink(Sink sink)

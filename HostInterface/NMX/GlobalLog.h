@@ -24,6 +24,9 @@ enum class ESeverity
   Trace = 7
 };
 
+/// As a line of the log has it: "warning".
+[[nodiscard]] std::string_view SeverityName(ESeverity severity);
+
 /// One message on its way to where logs go.
 struct LogRecord
 {

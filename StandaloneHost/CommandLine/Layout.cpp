@@ -1,12 +1,8 @@
 #include "StandaloneHost/CommandLine/Layout.h"
 
-#include <boost/locale/utf.hpp>
+#include "HostInterface/LoggingDetail/PrintableText.h"
 
 #include <algorithm>
-#include <clocale>
-#include <cstdio>
-#include <cstdlib>
-#include <cwchar>
 #include <sys/ioctl.h>
 #include <unistd.h>
 
@@ -16,63 +12,11 @@ namespace CommandLine
 namespace
 {
 
-namespace utf = boost::locale::utf;
-using Utf8 = utf::utf_traits<char>;
+using LoggingDetail::ColumnsOf;
+using LoggingDetail::TakeCharacter;
 
 constexpr std::size_t leastWidth = 20; // of a wrapped cell, however narrow the terminal
 constexpr std::size_t longestQuote = 200;
-
-/// Takes the next character off the text; `utf::illegal` or `utf::incomplete` for a byte that begins none.
-utf::code_point TakeCharacter(std::string_view& text)
-{
-  const char* position = text.data();
-  const utf::code_point character = Utf8::decode(position, text.data() + text.size());
-  const bool good = utf::is_valid_codepoint(character);
-  text.remove_prefix(good ? static_cast<std::size_t>(position - text.data()) : 1);
-  return character;
-}
-
-/// Columns that a character takes; negative when it cannot be shown. Whatever locale the user has: the host's texts are
-/// UTF-8.
-int Width(utf::code_point character)
-{
-  static const locale_t locale = newlocale(LC_CTYPE_MASK, "C.UTF-8", nullptr);
-  if (locale == nullptr)
-    return character >= 0x20 && character < 0x7F ? 1 : -1;
-  const locale_t before = uselocale(locale);
-  const int width = wcwidth(static_cast<wchar_t>(character));
-  uselocale(before);
-  return width;
-}
-
-/// Characters without a shape that turn or join what stands around them.
-bool IsInvisible(utf::code_point character)
-{
-  return (character >= 0x200B && character <= 0x200F) || (character >= 0x2028 && character <= 0x202E) ||
-         (character >= 0x2060 && character <= 0x206F) || character == 0xFEFF || character == 0xAD ||
-         (character >= 0xE0000 && character <= 0xE0FFF);
-}
-
-std::string Escape(utf::code_point character, char byte)
-{
-  switch (character)
-  {
-  case '\n':
-    return "\\n";
-  case '\r':
-    return "\\r";
-  case '\t':
-    return "\\t";
-  default:
-    break;
-  }
-  char text[16];
-  if (!utf::is_valid_codepoint(character) || character < 0x80)
-    std::snprintf(text, sizeof text, "\\x%02x", static_cast<unsigned>(static_cast<unsigned char>(byte)));
-  else
-    std::snprintf(text, sizeof text, "\\u{%x}", static_cast<unsigned>(character));
-  return text;
-}
 
 /// The longest beginning of the text that takes at most `width` columns, but at least one character.
 std::size_t Fitting(std::string_view text, std::size_t width)
@@ -82,7 +26,7 @@ std::size_t Fitting(std::string_view text, std::size_t width)
   while (!rest.empty())
   {
     std::string_view next = rest;
-    columns += static_cast<std::size_t>(std::max(0, Width(TakeCharacter(next))));
+    columns += static_cast<std::size_t>(std::max(0, ColumnsOf(TakeCharacter(next))));
     if (columns > width && rest.size() != text.size())
       break;
     rest = next;
@@ -95,24 +39,14 @@ std::size_t Fitting(std::string_view text, std::size_t width)
 bool IsUtf8(std::string_view text)
 {
   while (!text.empty())
-    if (!utf::is_valid_codepoint(TakeCharacter(text)))
+    if (TakeCharacter(text) == LoggingDetail::notUtf8)
       return false;
   return true;
 }
 
 std::string Visible(std::string_view text)
 {
-  std::string visible;
-  while (!text.empty())
-  {
-    const std::string_view before = text;
-    const utf::code_point character = TakeCharacter(text);
-    if (!utf::is_valid_codepoint(character) || character < 0x20 || IsInvisible(character) || Width(character) < 0)
-      visible += Escape(character, before.front());
-    else
-      visible += before.substr(0, before.size() - text.size());
-  }
-  return visible;
+  return LoggingDetail::PrintableText(text);
 }
 
 std::string Quoted(std::string_view text)
@@ -127,7 +61,7 @@ std::size_t Columns(std::string_view visible)
 {
   std::size_t columns = 0;
   while (!visible.empty())
-    columns += static_cast<std::size_t>(std::max(0, Width(TakeCharacter(visible))));
+    columns += static_cast<std::size_t>(std::max(0, ColumnsOf(TakeCharacter(visible))));
   return columns;
 }
 

@@ -1,6 +1,7 @@
 #include "StandaloneHost/Files/WholeFile.h"
 
 #include "StandaloneHost/Files/ConfigurationError.h"
+#include "StandaloneHost/Store/WriteObstacle.h"
 
 #include <fcntl.h>
 #include <sys/stat.h>
@@ -25,7 +26,7 @@ namespace
 [[noreturn]] void FailWith(const fs::path& file, int error)
 {
   const bool full = error == ENOSPC || error == EDQUOT;
-  FailUnwritable(file, std::generic_category().message(error), full ? EResult::DiskFull : EResult::FileIOFailure);
+  FailUnwritable(file, Store::WriteErrorText(file, error), full ? EResult::DiskFull : EResult::FileIOFailure);
 }
 
 /// Where the content belongs: a link stays, what it names is replaced.

@@ -1,5 +1,7 @@
 #include "StandaloneHost/Store/SqliteArchive.h"
 
+#include "StandaloneHost/Store/WriteObstacle.h"
+
 #include <fcntl.h>
 #include <unistd.h>
 
@@ -46,10 +48,10 @@ std::string NewWriter()
   return std::to_string(getpid()) + '-' + std::to_string(random()) + '-' + std::to_string(random());
 }
 
-[[noreturn]] void FailWith(const char* what, int error)
+[[noreturn]] void FailWith(const char* what, const fs::path& file, int error)
 {
   const bool full = error == ENOSPC || error == EDQUOT;
-  throw DatabaseError(std::string(what) + ": " + std::generic_category().message(error),
+  throw DatabaseError(std::string(what) + ": " + WriteErrorText(file, error),
                       full ? EResult::DiskFull : EResult::FileIOFailure);
 }
 
@@ -61,7 +63,7 @@ void Move(const fs::path& from, const fs::path& to, bool replace)
   const bool unknown = errno == EINVAL || errno == ENOSYS; // to this file system
   if ((replace || unknown) && std::rename(from.c_str(), to.c_str()) == 0)
     return;
-  FailWith("the file cannot be written anew", errno);
+  FailWith("the file cannot be written anew", to, errno);
 }
 
 /// Sees to it that the names in a folder outlive a loss of power, as far as it can.
@@ -83,7 +85,7 @@ struct UnfinishedFile
     Remove();
     const int descriptor = open(path.c_str(), O_WRONLY | O_CREAT | O_EXCL | O_CLOEXEC, permissions);
     if (descriptor < 0)
-      FailWith("the file cannot be written anew", errno);
+      FailWith("the file cannot be written anew", path, errno);
     close(descriptor);
   }
   UnfinishedFile(const UnfinishedFile&) = delete;
@@ -241,7 +243,7 @@ void SqliteArchive::MakeAnew(const StoreState& content)
   made.Watch(unfinished.path);
   Drop();
   if (m_log.State() == EState::Same && unlink(m_log.Path().c_str()) != 0)
-    FailWith("its log cannot be removed", errno);
+    FailWith("its log cannot be removed", m_log.Path(), errno);
   Move(unfinished.path, m_file.Path(), m_file.State() == EState::Same);
   m_file.TakeOver(made);
   KeepNames(m_file.Path().parent_path());

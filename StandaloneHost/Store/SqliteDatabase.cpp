@@ -1,6 +1,7 @@
 #include "StandaloneHost/Store/SqliteDatabase.h"
 
 #include "StandaloneHost/Store/RecordText.h"
+#include "StandaloneHost/Store/WriteObstacle.h"
 
 #include <sqlite3.h>
 
@@ -73,6 +74,10 @@ std::string SqliteDatabase::Reason() const
     return "the file is damaged, or not a store (" + message + ')';
   if (code == SQLITE_FULL)
     return "the disk is full";
+  // SQLite tries other ways to open a file before it gives up, and tells what the last of them came to.
+  if (code == SQLITE_READONLY || code == SQLITE_CANTOPEN || code == SQLITE_IOERR)
+    if (std::string obstacle = WriteObstacle(m_file); !obstacle.empty())
+      return obstacle;
   if (const int error = SystemError(); error != 0)
     return message + " (" + std::generic_category().message(error) + ')';
   return message;
@@ -96,7 +101,7 @@ SqliteDatabase::SqliteDatabase(const std::filesystem::path& file, std::string wr
 }
 
 SqliteDatabase::SqliteDatabase(const std::filesystem::path& file, std::string writer, EJournal journal)
-    : m_writer(std::move(writer))
+    : m_file(file), m_writer(std::move(writer))
 {
   sqlite3* database = nullptr;
   const int opened = sqlite3_open_v2(file.c_str(), &database,

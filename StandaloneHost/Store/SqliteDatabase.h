@@ -103,6 +103,7 @@ private:
   [[nodiscard]] std::string Reason() const;
   [[noreturn]] void Fail(const std::string& what) const;
 
+  const std::filesystem::path m_file;
   const std::string m_writer;
   std::string m_lastWriter;
   bool m_writerKnown = false; // the file says that m_writer wrote last

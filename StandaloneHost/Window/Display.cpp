@@ -1,6 +1,9 @@
 #include "StandaloneHost/Window/Display.h"
 
+#include "HostInterface/LoggingDetail/PrintableText.h"
 #include "HostInterface/NMX/GlobalLog.h"
+#include "StandaloneHost/Logging/LogLine.h"
+#include "StandaloneHost/Logging/StandardStreams.h"
 
 #include <QGuiApplication>
 #include <QOffscreenSurface>
@@ -9,8 +12,8 @@
 #include <QQuickWindow>
 #include <QStringList>
 
-#include <cstdio>
 #include <cstdlib>
+#include <unistd.h>
 #include <utility>
 
 namespace Window
@@ -39,9 +42,15 @@ NMX::ESeverity SeverityOf(QtMsgType type)
   return NMX::ESeverity::Fatal;
 }
 
-void LogMessage(QtMsgType type, const QMessageLogContext& /*context*/, const QString& text)
+/// With the place in Qt's source, as far as Qt knows it.
+void LogMessage(QtMsgType type, const QMessageLogContext& context, const QString& text)
 {
-  NMX::Log(qtLog, SeverityOf(type), "%1%", text.toStdString());
+  const NMX::ESeverity severity = SeverityOf(type);
+  if (!NMX::GlobalLog::Enabled(severity))
+    return;
+  const std::string message = text.toStdString();
+  const std::string_view file = context.file != nullptr ? context.file : "";
+  NMX::GlobalLog::Write({qtLog.name, severity, message, file, static_cast<unsigned>(context.line)});
 }
 
 /// What Qt says while it opens the display.
@@ -59,8 +68,11 @@ void EndWithoutDisplay(QtMsgType type, const QMessageLogContext& /*context*/, co
   if (type != QtFatalMsg)
     return;
   const QString cause = Remarks().isEmpty() ? text.simplified() : Remarks().last();
-  std::fprintf(stderr, "subject-store-host: cannot open a window: %s (--headless does without)\n",
-               cause.toUtf8().constData());
+  (void)Logging::WriteWithin(STDERR_FILENO,
+                             "subject-store-host: cannot open a window: " +
+                                 LoggingDetail::PrintableText(cause.toStdString(), Logging::longestText) +
+                                 " (--headless does without)\n",
+                             Logging::patience);
   std::_Exit(2);
 }
 

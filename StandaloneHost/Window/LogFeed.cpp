@@ -3,19 +3,14 @@
 namespace Window
 {
 
-LogFeed::LogFeed(VLogModel& model) : m_former(NMX::GlobalLog::SetSink(nullptr))
+LogFeed::LogFeed(Logging::LogWriter& writer, VLogModel& model) : m_writer(writer)
 {
-  NMX::GlobalLog::SetSink(
-      [&model, former = m_former](const NMX::LogRecord& record)
-      {
-        former(record);
-        model.Append(record);
-      });
+  m_writer.SetListener([&model](const NMX::LogRecord& record) { model.Append(record); });
 }
 
 LogFeed::~LogFeed()
 {
-  NMX::GlobalLog::SetSink(m_former);
+  m_writer.SetListener(nullptr);
 }
 
 }

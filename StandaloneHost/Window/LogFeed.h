@@ -1,21 +1,22 @@
 #pragma once
 
+#include "StandaloneHost/Logging/LogWriter.h"
 #include "StandaloneHost/Window/VLogModel.h"
 
 namespace Window
 {
 
-/// While it lives, a model gets what is logged, beside whoever got it before. [host]
+/// While it lives, a model gets the messages that a writer of the log lets pass, as they are written. [host]
 class LogFeed
 {
 public:
-  explicit LogFeed(VLogModel& model);
+  LogFeed(Logging::LogWriter& writer, VLogModel& model);
   LogFeed(const LogFeed&) = delete;
   LogFeed& operator=(const LogFeed&) = delete;
   ~LogFeed();
 
 private:
-  const NMX::GlobalLog::Sink m_former;
+  Logging::LogWriter& m_writer;
 };
 
 }

@@ -2,7 +2,6 @@
 
 #include <QDateTime>
 
-#include <array>
 #include <utility>
 
 namespace Window
@@ -10,8 +9,6 @@ namespace Window
 
 namespace
 {
-
-constexpr std::array severityNames{"fatal", "critical", "error", "warning", "notice", "info", "debug", "trace"};
 
 QString ToText(std::string_view text)
 {
@@ -95,7 +92,7 @@ QVariant VLogModel::data(const QModelIndex& index, int role) const
   case Severity:
     return static_cast<int>(message.severity);
   case SeverityName:
-    return severityNames[static_cast<std::size_t>(message.severity)];
+    return ToText(NMX::SeverityName(message.severity));
   case Channel:
     return message.channel;
   case Text:

@@ -49,12 +49,13 @@ const std::map<std::string, std::set<std::string>> allowed{
 
     {"StandaloneHost/Store", {"HostInterface", "StoreInterface"}},
     {"StandaloneHost/Evaluation", {"HostInterface", "StoreInterface"}},
+    {"StandaloneHost/Logging", {"HostInterface"}},
     {"StandaloneHost/Postal", {"HostInterface"}},
     {"StandaloneHost/Page", {}},
     {"StandaloneHost/Server", {"StandaloneHost/Page", "HostInterface"}},
     {"StandaloneHost/Simulation", {"HostInterface", "StoreInterface"}},
-    {"StandaloneHost/CommandLine", {"StandaloneHost/Server"}},
-    {"StandaloneHost/Window", {"StandaloneHost/Server", "HostInterface"}},
+    {"StandaloneHost/CommandLine", {"StandaloneHost/Server", "HostInterface"}},
+    {"StandaloneHost/Window", {"StandaloneHost/Logging", "StandaloneHost/Server", "HostInterface"}},
     {"StandaloneHost/Files", {"StandaloneHost/Store", "HostInterface", "StoreInterface"}},
     {"StandaloneHost/Settings", {"StandaloneHost/Store", "HostInterface", "StoreInterface"}},
     {"StandaloneHost/Calibration", {"StandaloneHost/Files", "StandaloneHost/Store", "HostInterface", "StoreInterface"}},
@@ -69,8 +70,8 @@ const std::map<std::string, std::set<std::string>> allowed{
      {"StandaloneHost/FileIO", "StandaloneHost/Panel", "StandaloneHost/Store", "StandaloneHost/Postal",
       "StandaloneHost/Server", "StandaloneHost/Files", "StandaloneHost/Calibration", "StandaloneHost/Settings",
       "StandaloneHost/Characters", "StandaloneHost/CommandLine", "StandaloneHost/Evaluation",
-      "StandaloneHost/Simulation", "StandaloneHost/SmartObjects", "StandaloneHost/Window", "HostInterface",
-      "StoreInterface"}},
+      "StandaloneHost/Simulation", "StandaloneHost/SmartObjects", "StandaloneHost/Logging", "StandaloneHost/Window",
+      "HostInterface", "StoreInterface"}},
 };
 
 /// The folder of `allowed` that a file belongs to: the deepest that its path begins with.

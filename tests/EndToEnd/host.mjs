@@ -101,8 +101,8 @@ function assertNoSanitizerReport(stderr) {
 }
 
 // Runs the host with options that keep it from starting.
-export async function refusedStart(options, environment) {
-  const process = launch(options, environment);
+export async function refusedStart(options, environment, launcher) {
+  const process = launch(options, environment, launcher);
   try {
     await until(`${options.join(' ')} ends the host`, () => process.hasEnded || process.stdout.includes('listening'),
                 { seconds: 10, seen: () => process.report });
@@ -118,8 +118,9 @@ class Host {
   #process;
   #killed = false;
 
-  constructor(process, { url, ws }) {
+  constructor(process, { url, ws }, readyFile) {
     this.#process = process;
+    this.readyFile = readyFile;
     this.url = url;
     this.ws = ws;
     this.port = Number(new URL(url).port);
@@ -171,7 +172,7 @@ export async function startHost({ subjects, devices, config, data = ':memory:', 
     // The file appears whole: no second look.
     const ready = JSON.parse(readFileSync(readyFile, 'utf8'));
     assert.equal(ready.pid, process.pid);
-    return new Host(process, ready);
+    return new Host(process, ready, readyFile);
   } catch (failure) {
     process.kill();
     throw failure;

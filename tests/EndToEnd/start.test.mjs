@@ -1,8 +1,8 @@
 // Starting the host: what it refuses, in one line, and whom it lets in.
 
 import assert from 'node:assert/strict';
-import { readFileSync } from 'node:fs';
-import { join } from 'node:path';
+import { existsSync, readFileSync, renameSync, symlinkSync, writeFileSync } from 'node:fs';
+import { join, relative } from 'node:path';
 import { describe, test } from 'node:test';
 
 import { assertSucceeds } from './api.mjs';
@@ -25,6 +25,7 @@ function escaped(text) {
 
 const noPlugin = temporaryFile('no-plugin.so', 'This is no plugin.');
 const library = /\S*libc\.so\.6$/m.exec(readFileSync('/proc/self/maps', 'utf8'))[0];
+const good = configuration([{ name: 'Crate' }, { name: 'Barrel' }]);
 const token = temporaryFile('token', 'open sesame/42=\n');
 
 const refusedOptions = {
@@ -67,12 +68,49 @@ describe('The host refuses in one line', () => {
     test(what, async () => assertRefused(await refusedStart(['--data', ':memory:', ...options]), says, what));
 });
 
+test('A ready file that would replace a file of the host is refused, and that file stays', async () => {
+  const data = temporaryDirectory();
+  await withHost({ data, subjects }, () => {});
+  const link = join(temporaryDirectory(), 'link');
+  symlinkSync(data, link);
+  const storeLink = join(temporaryDirectory(), 'ready.json');
+  symlinkSync(join(data, 'store.sqlite'), storeLink);
+  const config = temporaryFile('stage.xml', good);
+  const configLink = join(link, '../stage.xml');
+  symlinkSync(config, configLink);
+  const [certificate, key] = ['cert', 'key'].map(name => temporaryFile(name, 'PEM'));
+  const encrypted = ['--tls-cert', certificate, '--tls-key', key];
+  const bytes = readFileSync(join(data, 'store.sqlite'));
+  for (const [file, options = []] of [
+    ...['store.sqlite', 'store.sqlite-wal', 'store.sqlite-shm', 'store.sqlite.unfinished', 'window.ini']
+      .map(name => [join(data, name)]),
+    [join(link, 'store.sqlite')], [storeLink], [join(data, 'none/../store.sqlite')],
+    [relative(process.cwd(), join(data, 'store.sqlite'))], [configLink, ['--config', config]],
+    [token, ['--token-file', token]], [certificate, encrypted], [key, encrypted],
+    [noPlugin, ['--plugin-file', noPlugin]],
+  ])
+    assertRefused(await refusedStart([...listen, '--data', data, '--ready-file', file, ...options]),
+                  /--ready-file: .*replace/, file);
+  assert.ok(readFileSync(join(data, 'store.sqlite')).equals(bytes));
+});
+
+test('The ready file goes with the host, unless it is another\'s by then', async () => {
+  let file;
+  await withHost({ options: ['--log', 'error'] }, host => { file = host.readyFile; });
+  assert.ok(!existsSync(file));
+  await withHost({}, host => {
+    file = host.readyFile;
+    writeFileSync(`${file}.new`, 'another');
+    renameSync(`${file}.new`, file);
+  });
+  assert.equal(readFileSync(file, 'utf8'), 'another');
+});
+
 test('A port in use is refused', () => withHost({}, async host => {
   const address = `127.0.0.1:${host.port}`;
   assertRefused(await refusedStart(['--data', ':memory:', '--listen', address]), escaped(String(host.port)), address);
 }));
 
-const good = configuration([{ name: 'Crate' }, { name: 'Barrel' }]);
 const barrel = '<Subject kind="BasicObjects" name="Barrel"></Subject>';
 
 // Each: what stands in the place of the fourth line's subject, and in which line the fault is.

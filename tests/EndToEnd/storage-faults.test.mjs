@@ -2,7 +2,7 @@
 // and nothing that was answered is lost once the fault has gone.
 
 import assert from 'node:assert/strict';
-import { cpSync, existsSync, mkdirSync, readdirSync, readFileSync, renameSync, rmSync, statfsSync, symlinkSync,
+import { chmodSync, cpSync, existsSync, mkdirSync, readdirSync, readFileSync, renameSync, rmSync, statfsSync, symlinkSync,
          unlinkSync, writeFileSync } from 'node:fs';
 import { join } from 'node:path';
 import { test } from 'node:test';
@@ -10,7 +10,7 @@ import { setTimeout as sleep } from 'node:timers/promises';
 
 import { assertFails, assertSucceeds, changed, outputsOf, snapshot } from './api.mjs';
 import { runSync } from './children.mjs';
-import { scaled, startHost, temporaryDirectory, until, withHost } from './host.mjs';
+import { refusedStart, scaled, startHost, temporaryDirectory, until, withHost } from './host.mjs';
 import { withConnection } from './wire.mjs';
 
 const subjects = Array.from({ length: 40 }, (_, i) => ({ name: `Object ${i}` }));
@@ -87,11 +87,11 @@ function fill(file) {
 }
 
 // A small disk that the host alone sees; undefined where that is not allowed.
-function ownDisk() {
+function ownDisk(options = 'size=2m') {
   for (const namespaces of [['--mount'], ['--map-root-user', '--mount']]) {
     const { data } = newFolder();
     mkdirSync(data);
-    const script = 'mount -t tmpfs -o size=2m,mode=700 none "$0" && exec "$@"';
+    const script = `mount -t tmpfs -o ${options},mode=700 none "$0" && exec "$@"`;
     const launcher = ['unshare', ...namespaces, 'sh', '-c', script, data];
     try {
       runSync(launcher[0], [...launcher.slice(1), 'true']);
@@ -120,6 +120,48 @@ test('A full disk', () => {
   const ballast = host => join(disk.place(host), 'ballast');
   return passes({ ...disk, begin: host => fill(ballast(host)), end: host => unlinkSync(ballast(host)),
                   result: 'DiskFull', says: /the disk is full/ });
+});
+
+test('A disk that has room, but not for one more file', async t => {
+  const disk = ownDisk('size=2m,nr_inodes=4');
+  if (!disk)
+    return t.skip('nothing may be mounted');
+  const place = host => join(disk.place(host), 'ballast');
+  const host = await startHost({ data: disk.data, subjects, launcher: disk.launcher });
+  try {
+    await withConnection(host, async connection => {
+      unlinkSync(join(disk.place(host), 'store.sqlite'));
+      unlinkSync(join(disk.place(host), 'store.sqlite-wal'));
+      assert.throws(() => { for (let i = 0; ; ++i) writeFileSync(`${place(host)}${i}`, ''); }, { code: 'ENOSPC' });
+      assertFails(await connection.call(setColor, ['Object 1', '#123456']), setColor, 'DiskFull');
+      assert.match((await lines(host, /cannot keep changes/))[0], /not for one more file/);
+    });
+  } finally {
+    await host.kill();
+  }
+  const none = ownDisk('size=2m,nr_inodes=1');
+  const refused = await refusedStart(['--data', none.data], undefined, none.launcher);
+  assert.match(refused.lines.join('\n'), /cannot use the store .*not for one more file/);
+});
+
+test('A store that may not be written is refused by the name of what is in the way', async () => {
+  const { data } = newFolder();
+  const file = join(data, 'store.sqlite');
+  await withHost({ data, subjects }, () => {});
+  const other = process.getuid() === 0 ? ['setpriv', '--reuid', '65534', '--clear-groups'] : [];
+  const refusal = async () =>
+    (await refusedStart(['--data', data, '--listen', '127.0.0.1:0'], undefined, other)).lines.join('\n');
+  for (const folder of [join(data, '..'), data])
+    chmodSync(folder, 0o777);
+  for (const [folderMode, fileMode, says] of [[0o777, 0o444, /the file is read-only for this user$/],
+                                              [0o555, 0o666, /its folder is read-only for this user$/],
+                                              [0o777, 0o222, /this user may not read the file$/]]) {
+    chmodSync(file, fileMode);
+    chmodSync(data, folderMode);
+    assert.match(await refusal(), says);
+  }
+  chmodSync(data, 0o777);
+  chmodSync(file, 0o666);
 });
 
 test('A file system that is read-only', () => {

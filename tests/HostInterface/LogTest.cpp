@@ -1,3 +1,4 @@
+#include "HostInterface/LoggingDetail/PrintableText.h"
 #include "tests/Support/LogCapture.h"
 
 #include <gmock/gmock.h>
@@ -57,4 +58,37 @@ TEST(Log, FormatsNothingBelowTheLevel)
   Log(systemLog, ESeverity::Warning, "%1%", Watched{written});
   EXPECT_EQ(written, 1);
   EXPECT_THAT(log.messages, ElementsAre("watched"));
+}
+
+TEST(Log, ShowsATextSoThatItCannotActOnTheTerminal)
+{
+  using LoggingDetail::PrintableText;
+  const struct
+  {
+    std::string_view text, shown;
+  } cases[]{
+      {"", ""},
+      {"plain \\, größer, 箱, 🎭", "plain \\, größer, 箱, 🎭"},
+      {"a\nb\tc\rd", "a\\nb\\tc\\rd"},
+      {std::string_view("\0\x1b[2J\x7f", 6), "\\x00\\x1b[2J\\x7f"},
+      {"\u0080 \u009b31m \u009f \u00a0", "\\u{80} \\u{9b}31m \\u{9f} \u00a0"},
+      {"\u202a\u202e \u2066\u2069 \u200b\u061c", "\\u{202a}\\u{202e} \\u{2066}\\u{2069} \\u{200b}\\u{61c}"},
+      {"\u2028\u2029", "\\u{2028}\\u{2029}"},
+      {"\x9b x \xff", "\\x9b x \\xff"},                        // bytes that begin nothing
+      {"a\xc3", "a\\xc3"},                                     // the end of the text in a character
+      {"\xe2\x82z \xc3(", "\\xe2\\x82z \\xc3("},               // another character in one
+      {"\xc0\xaf \xed\xa0\x80", "\\xc0\\xaf \\xed\\xa0\\x80"}, // overlong; half of a pair
+  };
+  for (const auto& [text, shown] : cases)
+    EXPECT_EQ(PrintableText(text, 100), shown);
+}
+
+TEST(Log, CutsATextAtACharacterAndSaysHowLongItIs)
+{
+  using LoggingDetail::PrintableText;
+  EXPECT_EQ(PrintableText("12345", 5), "12345");
+  EXPECT_EQ(PrintableText("123456", 5), "12345… (6 bytes in all)");
+  EXPECT_EQ(PrintableText("1234ö", 5), "1234… (6 bytes in all)");
+  EXPECT_EQ(PrintableText("123\x1b", 5), "123… (4 bytes in all)");
+  EXPECT_EQ(PrintableText(std::string(1 << 20, 'x'), 3), "xxx… (1048576 bytes in all)");
 }
