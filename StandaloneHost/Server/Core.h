@@ -151,6 +151,7 @@ struct Core
   std::size_t outgoingBytes = 0; ///< waiting for all clients to read them
   std::size_t webSockets = 0;    ///< of the connections
   std::uint64_t lastSession = 0;
+  std::uint64_t lastCaller = 0; ///< each connection is one
   bool closing = false;
 };
 

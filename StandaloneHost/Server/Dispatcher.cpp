@@ -156,7 +156,7 @@ std::string Dispatcher::Hello(std::uint64_t session) const
   return GreetingText({session, m_epoch, Api().hash, m_limits, m_grantedLevel});
 }
 
-std::size_t Dispatcher::Handle(std::string_view text, IListener* listener, Answer answer)
+std::size_t Dispatcher::Handle(std::string_view text, const NMX::Caller& caller, IListener* listener, Answer answer)
 {
   const Message message = ReadMessage(text, m_limits);
   if (message.complaint)
@@ -168,7 +168,7 @@ std::size_t Dispatcher::Handle(std::string_view text, IListener* listener, Answe
   m_calls.store(Calls() + calls, std::memory_order_relaxed); // nobody else writes it
   if (!message.batch)
   {
-    HandleRequest(message.requests.front(), listener, std::move(answer));
+    HandleRequest(message.requests.front(), caller, listener, std::move(answer));
     return 1;
   }
   const auto batch = std::make_shared<Batch>();
@@ -176,11 +176,11 @@ std::size_t Dispatcher::Handle(std::string_view text, IListener* listener, Answe
   batch->calls = calls;
   batch->answer = std::move(answer);
   for (const Request& request : message.requests)
-    HandleRequest(request, listener, [batch](const std::string& part, std::size_t) { batch->Take(part); });
+    HandleRequest(request, caller, listener, [batch](const std::string& part, std::size_t) { batch->Take(part); });
   return calls;
 }
 
-void Dispatcher::HandleRequest(const Request& request, IListener* listener, Answer answer)
+void Dispatcher::HandleRequest(const Request& request, const NMX::Caller& caller, IListener* listener, Answer answer)
 {
   const bool notification = request.id.empty();
   const auto answerNow = [&](std::string text) { answer(notification ? std::string{} : std::move(text), 1); };
@@ -193,13 +193,13 @@ void Dispatcher::HandleRequest(const Request& request, IListener* listener, Answ
       answerNow(FailureText(request.id, EResult::NotPermitted, entry->Meaning(EResult::NotPermitted),
                             "a preview function; the host opens these with --level 1"));
     else
-      Call(*entry, request, std::move(answer));
+      Call(*entry, request, caller, std::move(answer));
   }
   else
     answerNow(CallServer(request, listener));
 }
 
-void Dispatcher::Call(const FunctionEntry& entry, const Request& request, Answer answer)
+void Dispatcher::Call(const FunctionEntry& entry, const Request& request, const NMX::Caller& caller, Answer answer)
 {
   std::string ordered;
   std::string_view arguments = request.params;
@@ -214,7 +214,8 @@ void Dispatcher::Call(const FunctionEntry& entry, const Request& request, Answer
   }
   // The entry stays until every call has been finished.
   entry.function->Invoke(
-      arguments, [id = std::string(request.id), &entry, answer = std::move(answer)](const NMX::IServerReply& finished)
+      arguments, caller,
+      [id = std::string(request.id), &entry, answer = std::move(answer)](const NMX::IServerReply& finished)
       { answer(id.empty() ? std::string{} : ReplyText(id, entry, finished), 1); });
 }
 

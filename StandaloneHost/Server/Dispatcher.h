@@ -1,5 +1,6 @@
 #pragma once
 
+#include "HostInterface/NMX/Caller.h"
 #include "StandaloneHost/Server/ApiDocuments.h"
 #include "StandaloneHost/Server/Envelope.h"
 #include "StandaloneHost/Server/Notifier.h"
@@ -30,7 +31,7 @@ public:
 
   /// Carries out one message. `answer` is called exactly once, perhaps before this returns. `listener` is the client
   /// as one that can be told of changes; null when its transport cannot. Returns how many calls were begun.
-  std::size_t Handle(std::string_view text, IListener* listener, Answer answer);
+  std::size_t Handle(std::string_view text, const NMX::Caller& caller, IListener* listener, Answer answer);
 
   /// How many calls have been begun. [any]
   [[nodiscard]] std::uint64_t Calls() const { return m_calls.load(std::memory_order_relaxed); }
@@ -42,8 +43,8 @@ public:
   [[nodiscard]] const ApiDocuments& Api() const;
 
 private:
-  void HandleRequest(const Request& request, IListener* listener, Answer answer);
-  void Call(const FunctionEntry& entry, const Request& request, Answer answer);
+  void HandleRequest(const Request& request, const NMX::Caller& caller, IListener* listener, Answer answer);
+  void Call(const FunctionEntry& entry, const Request& request, const NMX::Caller& caller, Answer answer);
   [[nodiscard]] std::string CallServer(const Request& request, IListener* listener);
   [[nodiscard]] std::string Subscription(const SubscriptionText& text, const Request& request, IListener* listener);
 

@@ -278,7 +278,7 @@ private:
     try
     {
       // No notifications without a WebSocket. The body stays until the next request is read.
-      m_core->dispatcher.Handle(m_parser->get().body(), nullptr,
+      m_core->dispatcher.Handle(m_parser->get().body(), m_caller, nullptr,
                                 [self = shared_from_this()](std::string answer, std::size_t)
                                 {
                                   if (answer.empty())
@@ -342,6 +342,7 @@ private:
   }
 
   const std::shared_ptr<Core> m_core;
+  const NMX::Caller m_caller{++m_core->lastCaller};
   ClientStream m_stream;
   boost::beast::flat_buffer m_buffer;
   std::optional<http::request_parser<http::string_body>> m_parser;

@@ -76,7 +76,8 @@ TEST(PluginModule, RegistersTheGroupsThatTheMaskAllowsAndSurvivesItsDestruction)
       const bool evaluates = (mask & 0x200U) != 0;
       std::string_view text = evaluates ? "[\"Nobody\", \"Crate\"]" : "[\"Nobody\"]";
       std::promise<NMX::IResult> result;
-      server->kept->Invoke(text, [&](const NMX::IServerReply& reply) { result.set_value(reply.Result()); });
+      server->kept->Invoke(text, NMX::Caller{},
+                           [&](const NMX::IServerReply& reply) { result.set_value(reply.Result()); });
       // This host has no object evaluation.
       EXPECT_EQ(result.get_future().get(),
                 NMX::IResult(evaluates ? NMX::EResult::NotSupported : NMX::EResult::NotFound));
