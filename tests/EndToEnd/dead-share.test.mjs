@@ -95,13 +95,14 @@ test('A dead share keeps waiting those who ask for its files, for 5 s, and nobod
 
     // Each of the four threads hangs: for the fifth there is none, and it is told at once.
     const asked = performance.now();
-    assertFails(await other.call(...looks(share)[0]), `${smart}.AddFromTemplate`, 'Failed');
+    const [[fifth, itsParams]] = looks(share);
+    assertFails(await other.call(fifth, itsParams), fifth, 'Failed');
     assert.ok(performance.now() - asked < scaled(1000));
     assert.match(host.stderr, /AddFromTemplate: ".*Far\.sot" is not looked at, as too many files do not answer/);
     assert.deepEqual((await other.call(`${smart}.SmartObjectList`)).result.outputs, { Names: [] });
 
     revive();
-    await eventually(async () => (await other.call(...looks(share)[0])).result?.code, codes.Ok);
+    await eventually(async () => (await other.call(fifth, itsParams)).result?.code, codes.Ok);
     for (const [method, params] of looks(share).slice(1))
       assert.equal((await other.call(method, params)).result?.code, codes.Ok, method);
   }));
