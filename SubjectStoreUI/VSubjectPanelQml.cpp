@@ -5,6 +5,7 @@
 #include "HostInterface/ISmartObjectControls.h"
 #include "HostInterface/RunaCorePluginInterface/ICalibrationProvider.h"
 #include "HostInterface/RunaCorePluginInterface/IObjectPresetProvider.h"
+#include "RunaCorePluginSubjectStore/Subjects/NewCharacter.h"
 #include "StoreInterface/ColourText.h"
 #include "StoreInterface/EntryPaths.h"
 #include "SubjectStoreUI/PanelBackend.h"
@@ -311,12 +312,11 @@ VResultGadget VSubjectPanelQml::addCharacter(const QString& name, const QUrl& fi
   if (!file.isLocalFile())
     return {EResult::InvalidName, "A template has to be chosen."};
   TSubjectStoreId added;
-  const VResultGadget result = m_implementation->backend.Edit(
-      [&](NMX::IEntryEditor& editor)
+  const VResultGadget result = Subjects::Guarded(
+      [&]
       {
-        const IResult created =
-            controls->CreateFromTemplate(editor, name.toStdString(), file.toLocalFile().toStdString());
-        return created.Failed() ? created : editor.FindByName(name.toStdString(), added);
+        return Subjects::CreateCharacter(*m_implementation->backend.store, *controls, name.toStdString(),
+                                         file.toLocalFile().toStdString(), added);
       });
   if (!result.Failed())
     Q_EMIT subjectAdded(VStoreIdGadget(added));

@@ -90,12 +90,13 @@ void ThroughTheBinding(benchmark::State& state)
         colour = table.find(name)->second;
         return NMX::EResult::Ok;
       },
-      NMX::MakeShared<NotificationSystem::VAsioPostalServiceStrand>(postal));
+      std::make_shared<TerminalServer2::CallQueue>(
+          NMX::MakeShared<NotificationSystem::VAsioPostalServiceStrand>(postal)));
   std::string reply;
   for (auto _ : state)
   {
     std::string_view text = request;
-    function->Invoke(text,
+    function->Invoke(text, NMX::Caller{},
                      [&](const NMX::IServerReply& finished)
                      {
                        TextWriter writer;

@@ -1,5 +1,6 @@
 #pragma once
 
+#include "HostInterface/NMX/Caller.h"
 #include "HostInterface/NMX/IResult.h"
 #include "HostInterface/TerminalServer2/ArgumentType.h"
 #include "HostInterface/TerminalServer2/IValueWriter.h"
@@ -53,10 +54,12 @@ public:
 
   /// Reads the inputs, a JSON array, from the front of the request text and steps past what was read; then runs the
   /// call. `completion` is called exactly once: inside Invoke when the arguments are refused, otherwise on the
-  /// group's strand. [server]
-  virtual void Invoke(std::string_view& argumentText, Completion completion) = 0;
+  /// group's strand. The calls of a group run in the order of Invoke, but while one waits for a file, only those of its
+  /// caller wait behind it. The function stays until its calls have been finished. [server]
+  virtual void Invoke(std::string_view& argumentText, const Caller& caller, Completion completion) = 0;
 
-  /// Finishes every call that was accepted and has not run yet with `result`; none of them will run. [any]
+  /// Finishes every call that was accepted and has not run yet, or waits for a file, with `result`; none of them will
+  /// run. [any]
   virtual void FinishOutstanding(IResult result) = 0;
 };
 

@@ -1,7 +1,9 @@
 #include "RunaCorePluginSubjectStore/CharacterFromClustersServices/VCharacterFromClustersServices.h"
 
+#include "HostInterface/NMX/FileWork.h"
 #include "RunaCorePluginSubjectStore/CharacterFromClustersServices/CharacterWarnings.h"
 #include "RunaCorePluginSubjectStore/Subjects/NameCheck.h"
+#include "RunaCorePluginSubjectStore/Subjects/NewCharacter.h"
 #include "RunaCorePluginSubjectStore/Subjects/Slots.h"
 #include "RunaCorePluginSubjectStore/Subjects/SubjectAccess.h"
 #include "RunaCorePluginSubjectStore/Subjects/Warnings.h"
@@ -34,6 +36,12 @@ bool IsPath(const std::string& text)
   return text.find('\0') == std::string::npos && NMX::ToWide(text).has_value();
 }
 
+bool Exists(const std::filesystem::path& file)
+{
+  std::error_code error;
+  return exists(std::filesystem::status(file, error));
+}
+
 }
 
 VCharacterFromClustersServices::VCharacterFromClustersServices(std::shared_ptr<ICharacterControls> controls,
@@ -59,11 +67,8 @@ IResult VCharacterFromClustersServices::CreateCharacter(const std::string& chara
           return checked;
         if (!IsPath(templatePath))
           return EResult::InvalidArgument;
-        const auto editor = m_store->Editor();
-        if (const IResult created = m_controls->CreateFromTemplate(*editor, characterName, templatePath);
-            created.Failed())
-          return created;
-        return editor->Commit();
+        TSubjectStoreId id;
+        return Subjects::CreateCharacter(*m_store, *m_controls, characterName, templatePath, id);
       });
 }
 
@@ -152,16 +157,23 @@ IResult VCharacterFromClustersServices::CharacterRetargetPath(const std::string&
 IResult VCharacterFromClustersServices::SetCharacterRetargetPath(const std::string& characterName,
                                                                  const std::string& retargetPath)
 {
-  return Subjects::EditSubject(*m_store, characterName, MustBeCharacter,
-                               [&](NMX::IEntryEditor& editor, TSubjectStoreId id) -> IResult
-                               {
-                                 if (!IsPath(retargetPath))
-                                   return EResult::InvalidArgument;
-                                 std::error_code error;
-                                 if (!retargetPath.empty() && !exists(std::filesystem::status(retargetPath, error)))
-                                   return EResult::FileNotFound;
-                                 return editor.SetValue(id, Paths::Retarget(), NMX::ToWide(retargetPath).value());
-                               });
+  // The character is found before the path is looked at, and no edit is open meanwhile.
+  if (const IResult found =
+          Subjects::ReadSubject(*m_store, characterName, MustBeCharacter,
+                                [](const NMX::IStoreReader&, TSubjectStoreId) -> IResult { return EResult::Ok; });
+      found.Failed())
+    return found;
+  return Subjects::Guarded(
+      [&]() -> IResult
+      {
+        if (!IsPath(retargetPath))
+          return EResult::InvalidArgument;
+        if (!retargetPath.empty())
+          if (const auto there = NMX::LookAtFile(retargetPath, &Exists); !there || !*there)
+            return EResult::FileNotFound;
+        return Subjects::WriteEntry(*m_store, characterName, MustBeCharacter, Paths::Retarget(),
+                                    NMX::ToWide(retargetPath).value());
+      });
 }
 
 IResult VCharacterFromClustersServices::SlotNames(const std::string& characterName,

@@ -3,6 +3,7 @@
 #include "RunaCorePluginSubjectStore/SubjectCalibrationServices/Settings.h"
 #include "RunaCorePluginSubjectStore/Subjects/NameCheck.h"
 #include "RunaCorePluginSubjectStore/Subjects/SubjectAccess.h"
+#include "StoreInterface/TryToAdd.h"
 
 #include <set>
 #include <utility>
@@ -30,6 +31,21 @@ auto MakeCallback()
 bool IsCaptureName(const std::string& name)
 {
   return name.find_first_of(R"(/:*?"<>|.,;\)") == std::string::npos;
+}
+
+/// What the settings say of a new subject.
+struct NewSubject
+{
+  std::string name;
+  std::wstring labellingTemplate;
+  std::wstring skin;
+};
+
+NewSubject ReadNewSubject(const NMX::IStoreReader& reader)
+{
+  const auto* name = FindSetting<std::string>(reader, ESetting::CreateSubjectName);
+  return {name != nullptr ? *name : std::string{}, ChosenPath(reader, ESetting::CreateSubjectTemplate),
+          ChosenPath(reader, ESetting::CreateSubjectSkin)};
 }
 
 /// Runs a query; an exception that escapes it is logged, and the answer is no.
@@ -160,16 +176,18 @@ VSubjectCalibrationServices::CanCancelSubjectCalibrationChangedCallback()
   return m_canChanged[Cancel];
 }
 
-/// Adds the new subject to the store.
+/// Adds the new subject to the store. No edit is open while its files are read, which comes after its name is known to
+/// be possible.
 IResult VSubjectCalibrationServices::CreateSubject(TSubjectStoreId& subject)
 {
+  const auto [name, labellingTemplate, skin] = ReadNewSubject(*m_store->Reader());
+  if (const IResult possible = NMX::TryToAdd(*m_store, NMX::ESubjectKind::GeneralSubjects, name); possible.Failed())
+    return possible;
+  std::shared_ptr<const ISubjectTemplate> content;
+  if (const IResult read = m_creator->ReadTemplate(labellingTemplate, skin, content); read.Failed())
+    return read;
   const auto editor = m_store->Editor();
-  const auto* named = FindSetting<std::string>(*editor, ESetting::CreateSubjectName);
-  const std::string name = named != nullptr ? *named : std::string{};
-  if (const IResult created =
-          m_creator->CreateSubject(*editor, name, ChosenPath(*editor, ESetting::CreateSubjectTemplate),
-                                   ChosenPath(*editor, ESetting::CreateSubjectSkin));
-      created.Failed())
+  if (const IResult created = m_creator->CreateSubject(*editor, name, *content); created.Failed())
     return created;
   if (const IResult found = editor->FindByName(name, subject); found.Failed())
     return found;

@@ -57,7 +57,7 @@ struct FunctionRow
   RowText text;
   ELevel level;
   std::shared_ptr<NMX::IServerFunction> (*bind)(const FunctionRecord&, const std::shared_ptr<Interface>&,
-                                                const std::shared_ptr<NMX::IPostalService>&);
+                                                const std::shared_ptr<CallQueue>&);
 };
 
 template <class Interface>
@@ -90,11 +90,11 @@ struct Binder<member, Interface, Result(Arguments...)>
 {
   static std::shared_ptr<NMX::IServerFunction> Bind(const FunctionRecord& record,
                                                     const std::shared_ptr<Interface>& service,
-                                                    const std::shared_ptr<NMX::IPostalService>& strand)
+                                                    const std::shared_ptr<CallQueue>& calls)
   {
     return NMX::MakeShared<VServerFunction<Result(Arguments...)>>(
         record, [service](Arguments... arguments)
-        { return ((*service).*member)(std::forward<Arguments>(arguments)...); }, strand);
+        { return ((*service).*member)(std::forward<Arguments>(arguments)...); }, calls);
   }
 };
 
@@ -205,11 +205,12 @@ void RegisterGroup(IServer& server, const GroupTable<Interface>& table, const st
                    const std::shared_ptr<NMX::IPostalService>& strand, const Grants& grants)
 {
   const Level typeLevel = LevelFor(table.typeLevel, grants);
+  const auto calls = std::make_shared<CallQueue>(strand);
   (void)server.RegisterType(typeLevel, table.group);
   for (const TypeRecord* type : table.types)
     (void)server.RegisterType(typeLevel, *type);
   for (const auto& row : table.functions)
-    (void)server.RegisterFunction(LevelFor(row.level, grants), row.bind(row.text.Record(), service, strand));
+    (void)server.RegisterFunction(LevelFor(row.level, grants), row.bind(row.text.Record(), service, calls));
   for (const auto& row : table.callbacks)
     (void)server.RegisterCallback(LevelFor(row.level, grants), row.bind(row.text.Record(), service, strand));
 }

@@ -12,8 +12,8 @@ namespace TerminalServer2
 using NMX::EResult;
 using NMX::IResult;
 
-ServerFunctionBase::ServerFunctionBase(const FunctionRecord& record, std::shared_ptr<NMX::IPostalService> postal)
-    : m_record(record), m_postal(std::move(postal))
+ServerFunctionBase::ServerFunctionBase(const FunctionRecord& record, std::shared_ptr<CallQueue> calls)
+    : m_record(record), m_calls(std::move(calls))
 {
 }
 
@@ -26,9 +26,10 @@ void ServerFunctionBase::Accept(const std::shared_ptr<VPendingReply>& reply, IRe
     reply->Finish();
     return;
   }
-  if (!m_postal)
+  if (!m_calls)
   {
-    RunAndFinish(*reply);
+    Run(*reply, nullptr);
+    reply->Finish();
     return;
   }
   try
@@ -38,7 +39,7 @@ void ServerFunctionBase::Accept(const std::shared_ptr<VPendingReply>& reply, IRe
     const auto place = m_outstanding.insert(reply).first;
     try
     {
-      m_postal->Post([self = SharedSelf(*this), reply] { self->RunPosted(reply); });
+      m_calls->Post([self = SharedSelf(*this), reply] { self->RunPosted(reply); });
       return;
     }
     catch (...)
@@ -55,20 +56,61 @@ void ServerFunctionBase::Accept(const std::shared_ptr<VPendingReply>& reply, IRe
   reply->Finish();
 }
 
-bool ServerFunctionBase::Take(const std::shared_ptr<VPendingReply>& reply)
+/// How often calls had been cancelled by then; nothing when the reply belongs to somebody else.
+std::optional<std::uint64_t> ServerFunctionBase::Take(const Reply& reply)
 {
   const std::lock_guard lock(m_mutex);
-  return m_outstanding.erase(reply) == 1;
+  return m_outstanding.erase(reply) == 1 ? std::optional(m_cancellations) : std::nullopt;
 }
 
-void ServerFunctionBase::RunPosted(const std::shared_ptr<VPendingReply>& reply)
+void ServerFunctionBase::RunPosted(const Reply& reply)
 {
-  if (Take(reply))
-    RunAndFinish(*reply);
+  const NMX::Caller caller = reply->MadeBy();
+  if (!m_calls->Holds(caller))
+  {
+    if (TakeAndRun(reply))
+      m_calls->Hold(caller);
+    return;
+  }
+  if (m_calls->Queue(caller, reply->ArgumentBytes(), TurnOf(SharedSelf(*this), reply, std::nullopt)) || !Take(reply))
+    return;
+  reply->SetResult(EResult::WouldBlock, "too much waits behind a call that waits for a file");
+  reply->Finish();
 }
 
-void ServerFunctionBase::RunAndFinish(VPendingReply& reply)
+/// A run of a call when its turn comes: the first one, or the one after a look at a file that ended like that. It keeps
+/// nothing alive: the reply lives in the outstanding set, or has been finished.
+CallQueue::Turn ServerFunctionBase::TurnOf(WeakSelf weakSelf, std::weak_ptr<VPendingReply> weakReply,
+                                           std::optional<NMX::EFileEnd> end)
 {
+  return [weakSelf = std::move(weakSelf), weakReply = std::move(weakReply), end]
+  {
+    const auto self = weakSelf.lock();
+    const auto reply = weakReply.lock();
+    if (!self || !reply)
+      return false;
+    if (end)
+      reply->Files().End(*end, self->m_record.name, self->m_calls->Files().Patience());
+    return self->TakeAndRun(reply);
+  };
+}
+
+/// Runs the call, unless somebody else has finished it, and finishes it, unless it now waits for a file: then true.
+bool ServerFunctionBase::TakeAndRun(const Reply& reply)
+{
+  const auto cancellations = Take(reply);
+  if (!cancellations)
+    return false;
+  Run(*reply, &reply->Files());
+  if (reply->Files().Waits())
+    return WaitForFile(reply, *cancellations);
+  reply->Finish();
+  return false;
+}
+
+void ServerFunctionBase::Run(VPendingReply& reply, NMX::FileWork* files)
+{
+  const NMX::CallContext context(reply.MadeBy(), files);
   try
   {
     reply.Run();
@@ -83,15 +125,58 @@ void ServerFunctionBase::RunAndFinish(VPendingReply& reply)
     NMX::Log(NMX::serverLog, NMX::ESeverity::Error, "%1%: an unknown exception", m_record.name);
     reply.SetResult(EResult::NoResult);
   }
-  reply.Finish();
+}
+
+/// Puts the reply back and has the file looked at that the call asks for; the call runs again afterwards. Finishes the
+/// reply when that cannot be: then false.
+bool ServerFunctionBase::WaitForFile(const Reply& reply, std::uint64_t cancellations)
+{
+  bool mine = true;
+  reply->SetResult(EResult::NoResult);
+  try
+  {
+    mine = !PutBack(reply, cancellations);
+    if (!mine)
+    {
+      reply->Files().Begin(m_calls->Files(),
+                           [queue = std::weak_ptr(m_calls), self = WeakSelf(SharedSelf(*this)),
+                            weakReply = std::weak_ptr(reply), caller = reply->MadeBy()](auto end)
+                           {
+                             if (const auto calls = queue.lock())
+                               calls->PostTurn(caller, TurnOf(self, weakReply, end));
+                           });
+      return true;
+    }
+  }
+  catch (const std::exception& failure)
+  {
+    NMX::Log(NMX::serverLog, NMX::ESeverity::Error, "%1%: the call could not wait for a file: %2%", m_record.name,
+             failure.what());
+    mine = mine || Take(reply);
+  }
+  if (mine)
+    reply->Finish();
+  return false;
+}
+
+/// False when calls have been cancelled since the reply was taken; it has that result then.
+bool ServerFunctionBase::PutBack(const Reply& reply, std::uint64_t cancellations)
+{
+  const std::lock_guard lock(m_mutex);
+  if (m_cancellations == cancellations)
+    return m_outstanding.insert(reply).second;
+  reply->SetResult(m_cancelledWith);
+  return false;
 }
 
 void ServerFunctionBase::FinishOutstanding(IResult result)
 {
-  std::unordered_set<std::shared_ptr<VPendingReply>> taken;
+  std::unordered_set<Reply> taken;
   {
     const std::lock_guard lock(m_mutex);
     taken.swap(m_outstanding);
+    ++m_cancellations;
+    m_cancelledWith = result;
   }
   for (const auto& reply : taken)
   {

@@ -25,20 +25,22 @@ class VServerFunction<ReturnType(Args...)> : public ServerFunctionBase
 public:
   using Callable = std::function<ReturnType(Args...)>;
 
-  VServerFunction(const FunctionRecord& record, Callable callable, std::shared_ptr<NMX::IPostalService> postal)
-      : ServerFunctionBase(record, std::move(postal)), m_callable(std::move(callable))
+  VServerFunction(const FunctionRecord& record, Callable callable, std::shared_ptr<CallQueue> calls)
+      : ServerFunctionBase(record, std::move(calls)), m_callable(std::move(callable))
   {
   }
 
   [[nodiscard]] std::span<const ArgumentType> Arguments() const override { return argumentTypes<Args...>; }
   [[nodiscard]] bool ReturnsTruth() const override { return std::is_same_v<ReturnType, bool>; }
 
-  void Invoke(std::string_view& argumentText, Completion completion) override
+  void Invoke(std::string_view& argumentText, const NMX::Caller& caller, Completion completion) override
   {
-    auto call = std::make_shared<Call>(std::move(completion), m_callable);
+    auto call = std::make_shared<Call>(caller, std::move(completion), m_callable);
+    const std::size_t before = argumentText.size();
     ArgumentReader reader(argumentText);
     std::size_t argumentsRead = 0;
     const NMX::IResult parsed = Parse(reader, call->values, argumentsRead, std::index_sequence_for<Args...>{});
+    call->SetArgumentBytes(before - argumentText.size());
     Accept(call, parsed, reader, argumentsRead);
   }
 
@@ -46,7 +48,10 @@ private:
   /// The reply and the arguments of one call. Refers to the function's callable; the posted task keeps the function.
   struct Call final : VPendingReply
   {
-    Call(Completion completion, const Callable& called) : VPendingReply(std::move(completion)), callable(called) {}
+    Call(const NMX::Caller& caller, Completion completion, const Callable& called)
+        : VPendingReply(caller, std::move(completion)), callable(called)
+    {
+    }
 
     [[nodiscard]] std::optional<bool> Returned() const override { return returned; }
 

@@ -21,6 +21,13 @@ namespace Paths = NMX::Paths;
 namespace
 {
 
+struct VSubjectTemplate final : ISubjectTemplate
+{
+  std::wstring file;
+  std::shared_ptr<const LabellingTemplate> labelling;
+  std::shared_ptr<const SubjectSkin> skin;
+};
+
 /// Empty for what is no path.
 std::filesystem::path PathOf(const std::wstring& text)
 {
@@ -46,24 +53,40 @@ IResult AddChildren(NMX::IEntryEditor& access, TSubjectStoreId subject, const st
 
 }
 
-IResult VSubjectCreator::CreateSubject(NMX::IEntryEditor& access, const std::string& name,
-                                       const std::wstring& labellingTemplate, const std::wstring& skin)
+IResult VSubjectCreator::ReadTemplate(const std::wstring& labellingTemplate, const std::wstring& skin,
+                                      std::shared_ptr<const ISubjectTemplate>& content) const
 {
+  const auto files = std::make_shared<VSubjectTemplate>();
+  files->file = labellingTemplate;
+  if (const IResult read =
+          Files::Read<&ReadLabellingTemplate>("labelling template", PathOf(labellingTemplate), files->labelling);
+      read.Failed())
+    return read;
+  if (skin.empty())
+  {
+    SubjectSkin none;
+    none.solving = false;
+    files->skin = std::make_shared<const SubjectSkin>(std::move(none));
+  }
+  else if (const IResult read = Files::Read<&ReadSubjectSkin>("subject skin", PathOf(skin), files->skin); read.Failed())
+    return read;
+  content = files;
+  return EResult::Ok;
+}
+
+IResult VSubjectCreator::CreateSubject(NMX::IEntryEditor& access, const std::string& name,
+                                       const ISubjectTemplate& content)
+{
+  const auto* files = dynamic_cast<const VSubjectTemplate*>(&content);
+  if (files == nullptr)
+    return EResult::InvalidType;
+  const LabellingTemplate& labelling = *files->labelling;
+  const SubjectSkin& solving = *files->skin;
   TSubjectStoreId subject;
   if (const IResult added = access.Add(NMX::ESubjectKind::GeneralSubjects, name, subject); added.Failed())
     return added;
-  LabellingTemplate labelling;
-  if (const IResult read =
-          Files::TryRead("labelling template", PathOf(labellingTemplate), &ReadLabellingTemplate, labelling);
-      read.Failed())
-    return read;
-  SubjectSkin solving;
-  solving.solving = false;
-  if (!skin.empty())
-    if (const IResult read = Files::TryRead("subject skin", PathOf(skin), &ReadSubjectSkin, solving); read.Failed())
-      return read;
   const std::pair<NMX::EntryPath, NMX::Value> entries[] = {
-      {Paths::FilePath(), labellingTemplate},   {Paths::RoleLabelling(), labelling.labelling},
+      {Paths::FilePath(), files->file},         {Paths::RoleLabelling(), labelling.labelling},
       {Paths::RoleSolving(), solving.solving},  {Paths::RoleRetargeting(), solving.retargeting},
       {Paths::ModelOutputCGM2(), solving.cgm2}, {Paths::ModelOutputPluginKinex(), solving.pluginKinex}};
   for (const auto& [path, value] : entries)

@@ -13,8 +13,10 @@ public:
   /// model outputs it has; without a skin it is not solved. `InvalidName`, `AlreadyPresent`, also for the name of
   /// something beneath it; `InvalidArgument` without a template; `FileNotFound`, `FileIOFailure`,
   /// `SerialisationFailure`: the log tells where and why.
-  NMX::IResult CreateSubject(NMX::IEntryEditor& access, const std::string& name, const std::wstring& labellingTemplate,
-                             const std::wstring& skin) override;
+  NMX::IResult CreateSubject(NMX::IEntryEditor& access, const std::string& name,
+                             const ISubjectTemplate& content) override;
+  NMX::IResult ReadTemplate(const std::wstring& labellingTemplate, const std::wstring& skin,
+                            std::shared_ptr<const ISubjectTemplate>& content) const override;
 };
 
 }

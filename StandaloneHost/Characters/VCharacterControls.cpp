@@ -18,6 +18,13 @@ namespace Paths = NMX::Paths;
 namespace
 {
 
+struct VCharacterTemplate final : ICharacterTemplate
+{
+  explicit VCharacterTemplate(std::shared_ptr<const CharacterTemplate> file) : content(std::move(file)) {}
+
+  const std::shared_ptr<const CharacterTemplate> content;
+};
+
 /// The template's slots, numbered from 1.
 std::vector<NMX::Slot> SlotsOf(const CharacterTemplate& content)
 {
@@ -43,15 +50,26 @@ void VCharacterControls::Stop()
   m_runs->Stop();
 }
 
-IResult VCharacterControls::CreateFromTemplate(NMX::IEntryEditor& access, const std::string& name,
-                                               const std::filesystem::path& file)
+IResult VCharacterControls::ReadTemplate(const std::filesystem::path& file,
+                                         std::shared_ptr<const ICharacterTemplate>& content) const
 {
+  std::shared_ptr<const CharacterTemplate> fromFile;
+  const IResult read = Files::Read<&Characters::ReadTemplate>("character template", file, fromFile);
+  if (read.Succeeded())
+    content = std::make_shared<VCharacterTemplate>(std::move(fromFile));
+  return read;
+}
+
+IResult VCharacterControls::CreateFromTemplate(NMX::IEntryEditor& access, const std::string& name,
+                                               const ICharacterTemplate& fromTemplate)
+{
+  const auto* read = dynamic_cast<const VCharacterTemplate*>(&fromTemplate);
+  if (read == nullptr)
+    return NMX::EResult::InvalidType;
+  const CharacterTemplate& content = *read->content;
   TSubjectStoreId id;
   if (const IResult added = access.Add(NMX::ESubjectKind::CharactersFromClusters, name, id); added.Failed())
     return added;
-  CharacterTemplate content;
-  if (const IResult read = Files::TryRead("character template", file, &ReadTemplate, content); read.Failed())
-    return read;
   if (const IResult set = access.SetValue(id, Paths::Slots(), SlotsOf(content)); set.Failed())
     return set;
   if (const IResult set = access.SetValue(id, Paths::RoleSolving(), content.solving); set.Failed())

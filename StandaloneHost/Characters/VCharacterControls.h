@@ -18,9 +18,11 @@ public:
   void Stop();
 
   NMX::IResult CreateFromTemplate(NMX::IEntryEditor& access, const std::string& name,
-                                  const std::filesystem::path& file) override;
+                                  const ICharacterTemplate& fromTemplate) override;
   NMX::IResult Calibrate(NMX::IEntryEditor& access, NMX::TSubjectStoreId character) override;
   NMX::IResult ClearCalibration(NMX::IEntryEditor& access, NMX::TSubjectStoreId character) override;
+  NMX::IResult ReadTemplate(const std::filesystem::path& file,
+                            std::shared_ptr<const ICharacterTemplate>& content) const override;
 
 private:
   const std::shared_ptr<CalibrationRuns> m_runs;

@@ -38,6 +38,7 @@ struct Core
   CallsInFlight calls{options.limits.callsInFlightOverall};
   std::size_t webSockets = 0; ///< of the connections
   std::uint64_t lastSession = 0;
+  std::uint64_t lastCaller = 0; ///< each connection is one
   bool closing = false;
 };
 

@@ -126,7 +126,7 @@ std::string Dispatcher::Hello(std::uint64_t session) const
   return GreetingText({session, m_epoch, Api().hash, m_limits, m_grantedLevel});
 }
 
-std::size_t Dispatcher::Handle(std::string_view text, IListener* listener, Answer answer)
+std::size_t Dispatcher::Handle(std::string_view text, const NMX::Caller& caller, IListener* listener, Answer answer)
 {
   const Message message = ReadMessage(text, m_limits);
   if (message.complaint)
@@ -138,7 +138,7 @@ std::size_t Dispatcher::Handle(std::string_view text, IListener* listener, Answe
   m_calls.store(Calls() + calls, std::memory_order_relaxed); // nobody else writes it
   if (!message.batch)
   {
-    HandleRequest(message.requests.front(), listener, {std::move(answer), nullptr, m_outgoing.get()});
+    HandleRequest(message.requests.front(), caller, listener, {std::move(answer), nullptr, m_outgoing.get()});
     return 1;
   }
   const auto batch = std::make_shared<Batch>(m_outgoing, calls, std::move(answer));
@@ -147,12 +147,13 @@ std::size_t Dispatcher::Handle(std::string_view text, IListener* listener, Answe
     if (batch->full && !request.complaint)
       batch->Take(request.id, request.id.empty() ? ResponseText{} : NotBegunText(request.id), EResult::Failed);
     else
-      HandleRequest(request, listener, {nullptr, batch, m_outgoing.get()});
+      HandleRequest(request, caller, listener, {nullptr, batch, m_outgoing.get()});
   }
   return calls;
 }
 
-void Dispatcher::HandleRequest(const Request& request, IListener* listener, Recipient recipient)
+void Dispatcher::HandleRequest(const Request& request, const NMX::Caller& caller, IListener* listener,
+                               Recipient recipient)
 {
   const auto refuse = [&](std::string text)
   { recipient.Take(request.id, request.id.empty() ? ResponseText{} : std::move(text), EResult::Failed); };
@@ -165,13 +166,14 @@ void Dispatcher::HandleRequest(const Request& request, IListener* listener, Reci
       refuse(FailureText(request.id, EResult::NotPermitted, entry->Meaning(EResult::NotPermitted),
                          "a preview function; the host opens these with --level 1"));
     else
-      Call(*entry, request, std::move(recipient));
+      Call(*entry, request, caller, std::move(recipient));
   }
   else
     CallServer(request, listener, recipient);
 }
 
-void Dispatcher::Call(const FunctionEntry& entry, const Request& request, Recipient recipient)
+void Dispatcher::Call(const FunctionEntry& entry, const Request& request, const NMX::Caller& caller,
+                      Recipient recipient)
 {
   std::string ordered;
   std::string_view arguments = request.params;
@@ -185,7 +187,7 @@ void Dispatcher::Call(const FunctionEntry& entry, const Request& request, Recipi
   }
   // The entry stays until every call has been finished.
   entry.function->Invoke(
-      arguments,
+      arguments, caller,
       [id = std::string(request.id), &entry, recipient = std::move(recipient)](const NMX::IServerReply& finished)
       { recipient.Take(id, id.empty() ? std::string{} : ReplyText(id, entry, finished), finished.Result()); });
 }

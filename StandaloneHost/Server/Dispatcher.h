@@ -1,5 +1,6 @@
 #pragma once
 
+#include "HostInterface/NMX/Caller.h"
 #include "StandaloneHost/Server/ApiDocuments.h"
 #include "StandaloneHost/Server/Envelope.h"
 #include "StandaloneHost/Server/Notifier.h"
@@ -32,7 +33,7 @@ public:
 
   /// Carries out one message. `answer` is called exactly once, perhaps before this returns. `listener` is the client
   /// as one that can be told of changes; null when its transport cannot. Returns how many calls were begun.
-  std::size_t Handle(std::string_view text, IListener* listener, Answer answer);
+  std::size_t Handle(std::string_view text, const NMX::Caller& caller, IListener* listener, Answer answer);
 
   /// How many calls have been begun. [any]
   [[nodiscard]] std::uint64_t Calls() const { return m_calls.load(std::memory_order_relaxed); }
@@ -57,8 +58,8 @@ private:
     const OutgoingBytes* outgoing;
   };
 
-  void HandleRequest(const Request& request, IListener* listener, Recipient recipient);
-  void Call(const FunctionEntry& entry, const Request& request, Recipient recipient);
+  void HandleRequest(const Request& request, const NMX::Caller& caller, IListener* listener, Recipient recipient);
+  void Call(const FunctionEntry& entry, const Request& request, const NMX::Caller& caller, Recipient recipient);
   void CallServer(const Request& request, IListener* listener, const Recipient& recipient);
   [[nodiscard]] std::string Subscribe(const Request& request, IListener* listener);
   [[nodiscard]] std::string Subscription(const SubscriptionText& text, const Request& request, IListener* listener);

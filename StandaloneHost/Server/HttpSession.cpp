@@ -304,7 +304,7 @@ private:
     try
     {
       // No notifications without a WebSocket. The body stays until the next request is read.
-      m_core->dispatcher.Handle(m_parser->get().body(), nullptr,
+      m_core->dispatcher.Handle(m_parser->get().body(), m_caller, nullptr,
                                 [self = shared_from_this()](ResponseText answer, std::size_t)
                                 { self->OnAnswer(std::move(answer)); });
     }
@@ -372,6 +372,7 @@ private:
   }
 
   const std::shared_ptr<Core> m_core;
+  const NMX::Caller m_caller{++m_core->lastCaller};
   ClientStream m_stream;
   boost::beast::flat_buffer m_buffer;
   std::optional<http::request_parser<http::string_body>> m_parser;

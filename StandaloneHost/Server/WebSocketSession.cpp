@@ -214,7 +214,7 @@ private:
     try
     {
       Count(static_cast<std::ptrdiff_t>(
-          m_core->dispatcher.Handle(text, this,
+          m_core->dispatcher.Handle(text, m_caller, this,
                                     [self = shared_from_this()](ResponseText answer, std::size_t calls)
                                     { self->OnAnswer(std::move(answer), calls); })));
     }
@@ -317,6 +317,7 @@ private:
   ClientStream& Client() { return m_stream.next_layer().next_layer(); }
 
   const std::shared_ptr<Core> m_core;
+  const NMX::Caller m_caller{++m_core->lastCaller};
   websocket::stream<CoalescingStream> m_stream;
   boost::beast::flat_buffer m_buffer;
   OutgoingQueue m_queue;

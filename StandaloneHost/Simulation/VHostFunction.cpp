@@ -158,7 +158,7 @@ VHostFunction::VHostFunction(const TerminalServer2::FunctionRecord& record,
 {
 }
 
-void VHostFunction::Invoke(std::string_view& argumentText, Completion completion)
+void VHostFunction::Invoke(std::string_view& argumentText, const NMX::Caller& /*caller*/, Completion completion)
 {
   const auto call = std::make_shared<Call>(std::move(completion));
   try

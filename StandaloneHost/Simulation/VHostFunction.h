@@ -36,7 +36,7 @@ public:
   [[nodiscard]] const TerminalServer2::FunctionRecord& Record() const override { return m_record; }
   [[nodiscard]] std::span<const TerminalServer2::ArgumentType> Arguments() const override { return m_arguments; }
   [[nodiscard]] bool ReturnsTruth() const override { return false; }
-  void Invoke(std::string_view& argumentText, Completion completion) override;
+  void Invoke(std::string_view& argumentText, const NMX::Caller& caller, Completion completion) override;
   void FinishOutstanding(NMX::IResult result) override;
 
 private:

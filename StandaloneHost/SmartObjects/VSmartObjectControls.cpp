@@ -1,16 +1,16 @@
 #include "StandaloneHost/SmartObjects/VSmartObjectControls.h"
 
 #include "HostInterface/NMX/GlobalLog.h"
+#include "StandaloneHost/Files/ReadResult.h"
 #include "StandaloneHost/SmartObjects/PatternSets.h"
 #include "StandaloneHost/SmartObjects/TemplateFile.h"
 #include "StandaloneHost/Store/NameRule.h"
 #include "StoreInterface/EntryPaths.h"
+#include "StoreInterface/TryToAdd.h"
 #include "StoreInterface/TypedAccess.h"
 
 #include <algorithm>
-#include <optional>
 #include <set>
-#include <system_error>
 #include <utility>
 
 namespace SmartObjects
@@ -117,28 +117,16 @@ IResult AddObject(NMX::IEntryEditor& editor, const std::string& name, Clusters c
 
 /// Reads a template. `FileNotFound`, or `Failed` with the reason in the log.
 IResult ReadTemplateFile(const std::filesystem::path& file, const DeviceLayouts& layouts,
-                         std::optional<SmartObjectTemplate>& content)
+                         std::shared_ptr<const SmartObjectTemplate>& content)
 {
-  std::error_code error;
-  const auto status = std::filesystem::status(file, error);
-  if (status.type() == std::filesystem::file_type::not_found)
-    return EResult::FileNotFound;
-  try
-  {
-    content = ReadTemplate(file);
-  }
-  catch (const Files::ConfigurationError& failure)
-  {
-    NMX::Log(NMX::subjectStoreLog, NMX::ESeverity::Error, "The smart object template cannot be used: %1%",
-             failure.what());
-    return EResult::Failed;
-  }
+  const IResult read = Files::Read<&ReadTemplate>("smart object template", file, content);
+  if (read.Failed())
+    return read == EResult::FileNotFound || file.empty() ? EResult::FileNotFound : EResult::Failed;
   for (const ClusterTemplate& cluster : content->clusters)
     if (!layouts.Known(cluster.type))
     {
-      NMX::Log(NMX::subjectStoreLog, NMX::ESeverity::Error,
-               "The smart object template cannot be used: %1%: there is no device type \"%2%\"", file.string(),
-               cluster.type);
+      Files::ReportUnusable("smart object template",
+                            file.string() + ": there is no device type " + Files::Quoted(cluster.type));
       return EResult::Failed;
     }
   return EResult::Ok;
@@ -206,23 +194,19 @@ IResult VSmartObjectControls::CreateFromTemplate(const std::string& name, const 
 {
   if (file.native().find('\0') != std::filesystem::path::string_type::npos)
     return EResult::InvalidArgument;
-  // Before the store is locked: a file can take its time.
-  std::optional<SmartObjectTemplate> content;
-  const IResult read = ReadTemplateFile(file, *m_layouts, content);
+  // A name that cannot be given is told first, and no edit is open while the file is read: it can take its time.
+  if (const IResult possible = NMX::TryToAdd(*m_store, ESubjectKind::SmartObjects, name); possible.Failed())
+    return possible;
+  std::shared_ptr<const SmartObjectTemplate> content;
+  if (const IResult read = ReadTemplateFile(file, *m_layouts, content); read.Failed())
+    return read;
   Clusters clusters;
-  if (content)
-    for (const ClusterTemplate& cluster : content->clusters)
-      clusters.push_back({cluster.label, {}, 0, cluster.type});
+  for (const ClusterTemplate& cluster : content->clusters)
+    clusters.push_back({cluster.label, {}, 0, cluster.type});
 
   const auto editor = m_store->Editor();
   TSubjectStoreId id;
-  if (read.Failed())
-  {
-    // A name that cannot be given is told first.
-    const IResult added = editor->Add(ESubjectKind::SmartObjects, name, id);
-    return added.Failed() ? added : read;
-  }
-  if (const IResult added = AddObject(*editor, name, std::move(clusters), std::move(content->additionalMarkers), id);
+  if (const IResult added = AddObject(*editor, name, std::move(clusters), content->additionalMarkers, id);
       added.Failed())
     return added;
   if (const IResult given = GivePatterns(*editor, {id}); given.Failed())

@@ -25,10 +25,12 @@ namespace
 class MockControls : public ICharacterControls
 {
 public:
-  MOCK_METHOD(IResult, CreateFromTemplate, (NMX::IEntryEditor&, const std::string&, const std::filesystem::path&),
+  MOCK_METHOD(IResult, CreateFromTemplate, (NMX::IEntryEditor&, const std::string&, const ICharacterTemplate&),
               (override));
   MOCK_METHOD(IResult, Calibrate, (NMX::IEntryEditor&, Id), (override));
   MOCK_METHOD(IResult, ClearCalibration, (NMX::IEntryEditor&, Id), (override));
+  MOCK_METHOD(IResult, ReadTemplate, (const std::filesystem::path&, std::shared_ptr<const ICharacterTemplate>&),
+              (const, override));
 };
 
 class CharacterServicesTest : public StoreFixture
@@ -166,22 +168,28 @@ TEST_F(CharacterServicesTest, TheHostMakesAndCalibratesInAnEditThatIsKeptOnlyOnS
     Id id;
     EXPECT_TRUE(editor.Add(NMX::ESubjectKind::CharactersFromClusters, name, id).Succeeded());
   };
-  EXPECT_CALL(*controls, CreateFromTemplate(_, "Bob", std::filesystem::path("")))
-      .WillOnce(
-          [&](NMX::IEntryEditor& editor, const std::string& name, const std::filesystem::path&)
-          {
-            add(editor, name);
-            return IResult(EResult::InvalidArgument);
-          });
+  EXPECT_CALL(*controls, ReadTemplate(std::filesystem::path(""), _)).WillOnce(Return(EResult::InvalidArgument));
   EXPECT_EQ(service->CreateCharacter("Bob", ""), IResult(EResult::InvalidArgument));
-  EXPECT_CALL(*controls, CreateFromTemplate(_, "Eve", std::filesystem::path("/x.cct")))
-      .WillOnce(
-          [&](NMX::IEntryEditor& editor, const std::string& name, const std::filesystem::path&)
+  const auto content = std::make_shared<const ICharacterTemplate>();
+  EXPECT_CALL(*controls, ReadTemplate(std::filesystem::path("/x.cct"), _))
+      .WillRepeatedly(
+          [&](const std::filesystem::path&, std::shared_ptr<const ICharacterTemplate>& read)
           {
-            add(editor, name);
+            add(*store->Editor(), "Eve"); // an edit can begin, as none is open
+            read = content;
             return IResult(EResult::Ok);
           });
-  EXPECT_TRUE(service->CreateCharacter("Eve", "/x.cct").Succeeded());
+  for (const EResult created : {EResult::AllocationFailure, EResult::Ok})
+  {
+    EXPECT_CALL(*controls, CreateFromTemplate(_, "Eve", testing::Ref(*content)))
+        .WillOnce(
+            [&](NMX::IEntryEditor& editor, const std::string& name, const ICharacterTemplate&)
+            {
+              add(editor, name);
+              return IResult(created);
+            });
+    EXPECT_EQ(service->CreateCharacter("Eve", "/x.cct"), IResult(created));
+  }
   std::set<std::string> names;
   EXPECT_TRUE(service->CharacterList(names).Succeeded());
   EXPECT_THAT(names, ElementsAre("Ada", "Eve"));

@@ -67,11 +67,11 @@ export class Connection {
   }
 
   // A call; its answer's envelope.
-  call(method, params) {
+  call(method, params, milliseconds = 5000) {
     const id = ++this.#lastId;
     const answer = new Promise((done, failed) => this.#calls.set(id, { done, failed }));
     this.socket.send(JSON.stringify({ jsonrpc: '2.0', id, method, params }));
-    return inTime(answer, `an answer to ${method}`);
+    return inTime(answer, `an answer to ${method}`, milliseconds);
   }
 
   notify(method, params) {

@@ -17,7 +17,7 @@ extern "C" int LLVMFuzzerTestOneInput(const unsigned char* data, std::size_t siz
   std::string_view text(reinterpret_cast<const char*>(data), size);
   const std::size_t before = text.size();
   int finished = 0;
-  function->Invoke(text,
+  function->Invoke(text, NMX::Caller{},
                    [&](const NMX::IServerReply& reply)
                    {
                      ++finished;

@@ -75,7 +75,8 @@ struct Stage
   template <class Signature, class Callable>
   void Add(const FunctionRecord& record, Callable callable)
   {
-    (void)server->RegisterFunction(2, NMX::MakeShared<VServerFunction<Signature>>(record, callable, postal));
+    (void)server->RegisterFunction(
+        2, NMX::MakeShared<VServerFunction<Signature>>(record, callable, std::make_shared<CallQueue>(postal)));
   }
 
   template <class Signature>

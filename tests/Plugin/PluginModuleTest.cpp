@@ -78,7 +78,8 @@ TEST(PluginModule, RegistersTheGroupsThatTheMaskAllowsAndSurvivesItsDestruction)
       std::string_view text = evaluates ? "[\"Nobody\", \"Crate\"]" : "[\"Nobody\"]";
       const auto reply = std::make_shared<std::promise<NMX::IResult>>();
       auto result = reply->get_future();
-      server->kept->Invoke(text, [reply](const NMX::IServerReply& made) { reply->set_value(made.Result()); });
+      server->kept->Invoke(text, NMX::Caller{},
+                           [reply](const NMX::IServerReply& made) { reply->set_value(made.Result()); });
       ASSERT_EQ(result.wait_for(std::chrono::seconds(20)), std::future_status::ready);
       // This host has no object evaluation.
       EXPECT_EQ(result.get(), NMX::IResult(evaluates ? NMX::EResult::NotSupported : NMX::EResult::NotFound));

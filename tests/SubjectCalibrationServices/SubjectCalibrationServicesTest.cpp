@@ -45,8 +45,9 @@ public:
 class MockCreator : public ISubjectCreator
 {
 public:
-  MOCK_METHOD(IResult, CreateSubject,
-              (NMX::IEntryEditor&, const std::string&, const std::wstring&, const std::wstring&), (override));
+  MOCK_METHOD(IResult, CreateSubject, (NMX::IEntryEditor&, const std::string&, const ISubjectTemplate&), (override));
+  MOCK_METHOD(IResult, ReadTemplate,
+              (const std::wstring&, const std::wstring&, std::shared_ptr<const ISubjectTemplate>&), (const, override));
 };
 
 struct Notifications : ICalibrationNotifications
@@ -85,9 +86,17 @@ protected:
   /// What the creator does: the subject and something beneath it.
   void ExpectCreation(IResult result = EResult::Ok)
   {
-    EXPECT_CALL(*creator, CreateSubject(_, "Zoe", std::wstring(L"/t/Short.lbt"), std::wstring(L"/s/Adult.skin")))
+    EXPECT_CALL(*creator, ReadTemplate(std::wstring(L"/t/Short.lbt"), std::wstring(L"/s/Adult.skin"), _))
         .WillOnce(
-            [this, result](NMX::IEntryEditor& editor, const std::string& name, const std::wstring&, const std::wstring&)
+            [this](const std::wstring&, const std::wstring&, std::shared_ptr<const ISubjectTemplate>& read)
+            {
+              EXPECT_NE(store->Editor(), nullptr) << "an edit can begin, as none is open";
+              read = content;
+              return IResult(EResult::Ok);
+            });
+    EXPECT_CALL(*creator, CreateSubject(_, "Zoe", testing::Ref(*content)))
+        .WillOnce(
+            [this, result](NMX::IEntryEditor& editor, const std::string& name, const ISubjectTemplate&)
             {
               EXPECT_TRUE(editor.Add(NMX::ESubjectKind::GeneralSubjects, name, zoe).Succeeded());
               EXPECT_TRUE(editor.Add(NMX::ESubjectKind::Props, name + " hat", hat).Succeeded());
@@ -111,6 +120,7 @@ protected:
 
   std::shared_ptr<NiceMock<MockController>> controller = std::make_shared<NiceMock<MockController>>();
   std::shared_ptr<MockCreator> creator = std::make_shared<MockCreator>();
+  const std::shared_ptr<const ISubjectTemplate> content = std::make_shared<const ISubjectTemplate>();
   Notifications notifications;
   std::shared_ptr<ManualPostal> postal = std::make_shared<ManualPostal>();
   std::shared_ptr<Service> service = Service::Make(store, controller, creator, notifications, postal);

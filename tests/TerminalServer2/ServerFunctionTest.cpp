@@ -61,13 +61,14 @@ class ServerFunctionTest : public testing::Test
 protected:
   void Make(VServerFunction<Signature>::Callable callable, std::shared_ptr<NMX::IPostalService> service)
   {
-    function = NMX::MakeShared<VServerFunction<Signature>>(record, std::move(callable), std::move(service));
+    const auto queue = service ? std::make_shared<CallQueue>(std::move(service)) : nullptr;
+    function = NMX::MakeShared<VServerFunction<Signature>>(record, std::move(callable), queue);
   }
 
   /// Calls and returns what was left of the text.
   std::string Call(std::string_view text)
   {
-    function->Invoke(text, finished.Completion());
+    function->Invoke(text, NMX::Caller{}, finished.Completion());
     return std::string(text);
   }
 
@@ -232,7 +233,7 @@ TEST_F(ServerFunctionTest, FinishesAReplyOnceWhenACancellationRacesTheCall)
   for (int i = 0; i < rounds; ++i)
   {
     std::string_view text = R"(["a",true,1,1,1])";
-    function->Invoke(text, [&](const NMX::IServerReply&) { ++times; });
+    function->Invoke(text, NMX::Caller{}, [&](const NMX::IServerReply&) { ++times; });
     postal->RunAll();
   }
   done = true;
@@ -271,7 +272,7 @@ TEST(ServerFunction, AnswersTheTruthOfAQueryBesideItsOutputs)
       nullptr);
   std::string_view text = "[]";
   std::optional<bool> returned;
-  query->Invoke(text,
+  query->Invoke(text, NMX::Caller{},
                 [&](const NMX::IServerReply& reply)
                 {
                   EXPECT_EQ(reply.Result(), IResult(EResult::Ok));

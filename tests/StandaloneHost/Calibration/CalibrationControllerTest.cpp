@@ -225,8 +225,11 @@ TEST_F(CalibrationControllerTest, TheCreatorMakesWhatTemplateAndSkinSay)
   Calibration::VSubjectCreator creator;
   const auto create = [&](const char* name, const std::wstring& from, const std::wstring& with)
   {
+    std::shared_ptr<const ISubjectTemplate> content;
+    if (const IResult read = creator.ReadTemplate(from, with, content); read.Failed())
+      return read;
     const auto editor = store->Editor();
-    const IResult made = creator.CreateSubject(*editor, name, from, with);
+    const IResult made = creator.CreateSubject(*editor, name, *content);
     return made.Failed() ? made : editor->Commit();
   };
   ASSERT_EQ(create("Zoe", labelling, skin), IResult(EResult::Ok));

@@ -33,7 +33,11 @@ protected:
 
   IResult Create(const std::string& name, const std::filesystem::path& file)
   {
-    return Edit([&](NMX::IEntryEditor& editor) { return controls->CreateFromTemplate(editor, name, file); });
+    std::shared_ptr<const ICharacterTemplate> content;
+    const IResult read = controls->ReadTemplate(file, content);
+    return read.Failed() ? read
+                         : Edit([&](NMX::IEntryEditor& editor)
+                                { return controls->CreateFromTemplate(editor, name, *content); });
   }
 
   IResult Calibrate(Id id)

@@ -42,8 +42,10 @@ TEST_F(FileIOTest, ATemplateOfASubjectReadsBackAsWhatItStartsWith)
 TEST_F(FileIOTest, ATemplateOfAGeneralSubjectHasTheSkeletonThatItWasMadeFrom)
 {
   const fs::path made = sources / "StandaloneHost/Calibration/Templates/Performer with staff.lbt";
-  Change([&](NMX::IEntryEditor& editor)
-         { EXPECT_TRUE(Calibration::VSubjectCreator().CreateSubject(editor, "Anna", Wide(made), L"").Succeeded()); });
+  Calibration::VSubjectCreator creator;
+  std::shared_ptr<const ISubjectTemplate> content;
+  ASSERT_TRUE(creator.ReadTemplate(Wide(made), L"", content).Succeeded());
+  Change([&](NMX::IEntryEditor& editor) { EXPECT_TRUE(creator.CreateSubject(editor, "Anna", *content).Succeeded()); });
   const Id anna = Find("Anna");
   auto expected = Calibration::ReadLabellingTemplate(made);
   ASSERT_TRUE(io.ExportTemplate(anna, Wide(file), reason).Succeeded()) << reason;

@@ -37,7 +37,7 @@ protected:
   std::string Call(std::string_view text)
   {
     times = 0;
-    function->Invoke(text,
+    function->Invoke(text, NMX::Caller{},
                      [this](const NMX::IServerReply& reply)
                      {
                        ++times;
@@ -156,7 +156,7 @@ TEST_F(HostFunctionTest, FinishesACallOnceWhenACancellationRacesIt)
   for (int i = 0; i < rounds; ++i)
   {
     std::string_view text = sound;
-    function->Invoke(text, [this](const NMX::IServerReply&) { ++times; });
+    function->Invoke(text, NMX::Caller{}, [this](const NMX::IServerReply&) { ++times; });
     postal->RunAll();
   }
   done = true;
