@@ -50,7 +50,7 @@ const SubjectRecord* StoreState::FindCanonical(std::string_view name) const
   return ids.empty() ? nullptr : Find(ids.front());
 }
 
-void StoreState::Erase(NMX::TSubjectStoreId id)
+void StoreState::Erase(NMX::TSubjectStoreId id, bool linksStay)
 {
   const auto found = m_records.find(id);
   if (found == m_records.end())
@@ -60,14 +60,15 @@ void StoreState::Erase(NMX::TSubjectStoreId id)
   if (!NameRule::IsAscii(name))
     EraseFrom(m_otherNames, NameRule::Canonical(name), id);
   m_kinds[static_cast<std::size_t>(found->second->kind)].erase(id);
-  for (const std::string& key : LinksOf(*found->second))
-    EraseFrom(m_links, key, id);
+  if (!linksStay)
+    for (const std::string& key : LinksOf(*found->second))
+      EraseFrom(m_links, key, id);
   m_autoAssignable.erase(id);
   m_awaitingObjects.erase(id);
   m_records.erase(found);
 }
 
-void StoreState::Insert(std::unique_ptr<SubjectRecord> record)
+void StoreState::Insert(std::unique_ptr<SubjectRecord> record, bool linksStay)
 {
   auto& place = m_records[record->id];
   place = std::move(record);
@@ -75,8 +76,9 @@ void StoreState::Insert(std::unique_ptr<SubjectRecord> record)
   if (!NameRule::IsAscii(place->Name()))
     m_otherNames[NameRule::Canonical(place->Name())].insert(place->id);
   m_kinds[static_cast<std::size_t>(place->kind)].insert(place->id);
-  for (const std::string& key : LinksOf(*place))
-    m_links[key].insert(place->id);
+  if (!linksStay)
+    for (const std::string& key : LinksOf(*place))
+      m_links[key].insert(place->id);
   if (IsAutoAssignable(*place))
     m_autoAssignable.insert(place->id);
   if (AwaitsObjects(*place))
@@ -89,8 +91,11 @@ void StoreState::Apply(ChangeSet&& changes) noexcept
   for (auto& [id, change] : changes.subjects)
   {
     if (const SubjectRecord* old = Find(id); old != nullptr && change.record != nullptr)
+    {
       change.record->stamps = old->stamps;
-    Erase(id);
+      change.sameLinks = LinksOf(*old) == LinksOf(*change.record);
+    }
+    Erase(id, change.sameLinks);
   }
   for (auto& [id, change] : changes.subjects)
   {
@@ -99,7 +104,7 @@ void StoreState::Apply(ChangeSet&& changes) noexcept
     for (std::size_t aspect = 0; aspect < change.record->stamps.size(); ++aspect)
       if ((change.aspects >> aspect & 1U) != 0)
         change.record->stamps[aspect] = ++m_lastStamp;
-    Insert(std::move(change.record));
+    Insert(std::move(change.record), change.sameLinks);
   }
   for (auto& [path, value] : changes.applicationEntries)
   {

@@ -22,6 +22,7 @@ struct ChangedSubject
   std::unique_ptr<SubjectRecord> record; ///< null when the subject is removed
   NMX::ESubjectKind kind;
   std::uint8_t aspects = 0; ///< one bit for each EAspect that changed
+  bool sameLinks = false;   ///< as before the change; worked out when it is applied
 };
 
 /// What one commit changes.
@@ -75,16 +76,19 @@ public:
   void Apply(ChangeSet&& changes) noexcept;
 
 private:
+  /// The standard hash takes a long text by words, not by bytes.
+  using TextIndex = boost::unordered_flat_map<std::string, std::set<NMX::TSubjectStoreId>, std::hash<std::string>>;
+
   [[nodiscard]] const SubjectRecord* FindCanonical(std::string_view name) const;
-  void Insert(std::unique_ptr<SubjectRecord> record);
-  void Erase(NMX::TSubjectStoreId id);
+  void Insert(std::unique_ptr<SubjectRecord> record, bool linksStay);
+  void Erase(NMX::TSubjectStoreId id, bool linksStay);
 
   boost::unordered_flat_map<NMX::TSubjectStoreId, std::unique_ptr<SubjectRecord>, std::hash<NMX::TSubjectStoreId>>
       m_records;
-  boost::unordered_flat_map<std::string_view, const SubjectRecord*> m_names;           // keys look into the records
-  boost::unordered_flat_map<std::string, std::set<NMX::TSubjectStoreId>> m_otherNames; // not ASCII; by canonical form
+  boost::unordered_flat_map<std::string_view, const SubjectRecord*> m_names; // keys look into the records
+  TextIndex m_otherNames;                                                    // not ASCII; by canonical form
   std::array<std::set<NMX::TSubjectStoreId>, NMX::allSubjectKinds.size()> m_kinds;
-  boost::unordered_flat_map<std::string, std::set<NMX::TSubjectStoreId>> m_links;
+  TextIndex m_links;
   std::set<NMX::TSubjectStoreId> m_autoAssignable;
   std::set<NMX::TSubjectStoreId> m_awaitingObjects;
   std::map<NMX::EntryPath, NMX::Value> m_application;
