@@ -21,7 +21,7 @@ struct PathText
 template <PathText path>
 [[nodiscard]] EntryPath PathConstant()
 {
-  static const EntryPath constant{std::string_view(path.text)};
+  static const EntryPath constant = EntryPath::Constant(path.text);
   return constant;
 }
 

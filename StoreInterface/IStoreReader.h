@@ -39,7 +39,7 @@ public:
   IStoreReader& operator=(const IStoreReader&) = delete;
   virtual ~IStoreReader() = default;
 
-  /// The subject of that name, of any kind. `NotFound` when there is none.
+  /// The subject of that name, of any kind; names are the same when their NFC is. `NotFound` when there is none.
   virtual IResult FindByName(std::string_view name, TSubjectStoreId& id) const = 0;
 
   /// Whether the subject is an object: SubjectFlag::rigid, SubjectFlag::smart, both or neither.

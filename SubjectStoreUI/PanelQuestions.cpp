@@ -111,7 +111,7 @@ QVariantList Markers(const PanelBackend& backend, TSubjectStoreId subject)
   QVariantList places;
   const auto append = [&](double x, double y, double z, std::uint32_t pattern)
   { places.append(QVariantMap{{"x", x}, {"y", y}, {"z", z}, {"pattern", pattern}}); };
-  for (const NMX::EntryPath path : {Paths::Markers(), Paths::AdditionalMarkerPositions()})
+  for (const NMX::EntryPath& path : {Paths::Markers(), Paths::AdditionalMarkerPositions()})
     for (const NMX::Position& marker : backend.Entry<Positions>(subject, path).value_or(Positions{}))
       append(marker.x, marker.y, marker.z, 0);
   double along = 0;

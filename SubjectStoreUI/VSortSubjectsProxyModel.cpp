@@ -82,7 +82,8 @@ bool VSortSubjectsProxyModel::Level::Holds(const QModelIndex& index) const
 
 std::string VSortSubjectsProxyModel::Text(const QModelIndex& index) const
 {
-  return index.data(sortRole()).toString().toStdString();
+  // What is one name in two forms of Unicode stands in one place.
+  return index.data(sortRole()).toString().normalized(QString::NormalizationForm_C).toStdString();
 }
 
 VSortSubjectsProxyModel::Level VSortSubjectsProxyModel::Rank(const QAbstractItemModel& model, int column,

@@ -2,6 +2,7 @@
 
 #include "HostInterface/NMX/GlobalLog.h"
 #include "StoreInterface/EntryPaths.h"
+#include "StoreInterface/ValueLimits.h"
 #include "SubjectStoreUI/SubjectsModelRole.h"
 
 #include <QPointer>
@@ -66,7 +67,7 @@ struct StoredPreset
 std::map<TSubjectStoreId, StoredPreset> ReadStored(const NMX::IStoreReader& access)
 {
   std::map<TSubjectStoreId, StoredPreset> stored;
-  for (const EntryPath path : access.ApplicationEntries(Presets()))
+  for (const EntryPath& path : access.ApplicationEntries(Presets()))
   {
     const auto entry = Parse(path);
     const NMX::Value* value = access.FindApplicationEntry(path);
@@ -95,7 +96,7 @@ std::vector<std::pair<EntryPath, NMX::Value>> Parameters(const NMX::IStoreReader
   std::vector<std::pair<EntryPath, NMX::Value>> parameters;
   if (!IsObject(access, object))
     return parameters;
-  for (const EntryPath path : {Paths::ColourRGBA(), Paths::ProximityGroupName(), Paths::TemplateGroupName()})
+  for (const EntryPath& path : {Paths::ColourRGBA(), Paths::ProximityGroupName(), Paths::TemplateGroupName()})
   {
     const NMX::Value* value = nullptr;
     if (access.Find(object, path, value).Succeeded() && value != nullptr)
@@ -197,7 +198,7 @@ bool VStoreObjectPresetModel::removePreset(const VStoreIdGadget& preset)
              *found->second.name);
     return false;
   }
-  for (const EntryPath path : found->second.entries)
+  for (const EntryPath& path : found->second.entries)
     if (editor->SetApplicationEntry(path, {}).Failed())
       return false;
   return editor->Commit().Succeeded();
@@ -206,7 +207,7 @@ bool VStoreObjectPresetModel::removePreset(const VStoreIdGadget& preset)
 bool VStoreObjectPresetModel::presetNameIsValid(const QString& name) const
 {
   const std::string text = name.toStdString();
-  return !text.empty() &&
+  return !text.empty() && NMX::ValueLimits::TextProblem(text).empty() &&
          std::none_of(m_presets.begin(), m_presets.end(), [&](const Preset& preset) { return preset.name == text; });
 }
 

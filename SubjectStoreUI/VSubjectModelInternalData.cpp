@@ -66,7 +66,7 @@ QVariant Roles(const NMX::IStoreReader& access, TSubjectStoreId subject)
 {
   QVariantList roles;
   int number = 0;
-  for (const NMX::EntryPath path : {Paths::RoleLabelling(), Paths::RoleSolving(), Paths::RoleRetargeting()})
+  for (const NMX::EntryPath& path : {Paths::RoleLabelling(), Paths::RoleSolving(), Paths::RoleRetargeting()})
   {
     const bool* has = Find<bool>(access, subject, path);
     if (has != nullptr && *has)

@@ -83,7 +83,7 @@ IResult SplitOne(NMX::IEntryEditor& editor, TSubjectStoreId object)
       return added;
     if (const IResult set = editor.SetValue(made, Paths::SmartClusters(), Clusters{cluster}); set.Failed())
       return set;
-    for (const NMX::EntryPath path :
+    for (const NMX::EntryPath& path :
          {Paths::ColourRGBA(), Paths::ProximityGroupName(), Paths::TemplateGroupName(), Paths::Enabled()})
       if (const IResult copied = CopyEntry(editor, object, made, path); copied.Failed())
         return copied;

@@ -1,5 +1,7 @@
 #include "RunaCorePluginSubjectStore/TerminalServer2/ArgumentReader.h"
 
+#include "HostInterface/NMX/IntegerText.h"
+
 #include <boost/json/monotonic_resource.hpp>
 #include <boost/json/static_resource.hpp>
 #include <boost/json/stream_parser.hpp>
@@ -7,6 +9,7 @@
 #include <charconv>
 #include <cmath>
 #include <limits>
+#include <optional>
 
 namespace TerminalServer2
 {
@@ -19,9 +22,6 @@ namespace
 
 constexpr std::size_t maximumDepth = 32;
 
-/// The greatest whole number up to which a double is exact.
-constexpr double exactDouble = 9007199254740992.0;
-
 void SkipWhiteSpace(std::string_view& text)
 {
   const auto isWhiteSpace = [](char c) { return c == ' ' || c == '\t' || c == '\n' || c == '\r'; };
@@ -29,26 +29,14 @@ void SkipWhiteSpace(std::string_view& text)
     text.remove_prefix(1);
 }
 
-/// A whole number, however it is written: 7, 7.0 and 70e-1 are the same number.
-bool WholeNumber(const boost::json::value& json, std::uint64_t& number)
+/// The integer that a value is, whose text is `token`: the parser may have taken it for the double next to it.
+std::optional<std::uint64_t> IntegerOf(const boost::json::value& json, std::string_view token)
 {
-  if (const auto* unsignedNumber = json.if_uint64())
-  {
-    number = *unsignedNumber;
-    return true;
-  }
-  if (const auto* signedNumber = json.if_int64(); signedNumber != nullptr && *signedNumber >= 0)
-  {
-    number = static_cast<std::uint64_t>(*signedNumber);
-    return true;
-  }
-  if (const auto* real = json.if_double();
-      real != nullptr && *real >= 0 && *real <= exactDouble && std::trunc(*real) == *real)
-  {
-    number = static_cast<std::uint64_t>(*real);
-    return true;
-  }
-  return false;
+  if (const auto* number = json.if_uint64())
+    return *number;
+  if (const auto* number = json.if_int64(); number != nullptr && *number >= 0)
+    return static_cast<std::uint64_t>(*number);
+  return json.is_double() ? NMX::IntegerFromJsonNumber(token) : std::nullopt;
 }
 
 }
@@ -136,30 +124,30 @@ IResult ArgumentReader::Bool(bool& value)
               });
 }
 
-IResult ArgumentReader::UInt64(std::uint64_t& value)
+template <class Number>
+IResult ArgumentReader::Integer(std::string_view expected, Number& value)
 {
-  return Next("a whole number from 0 to 18446744073709551615",
-              [&](const boost::json::value& json, std::string_view /*token*/)
+  return Next(expected,
+              [&](const boost::json::value& json, std::string_view token)
               {
                 if (!json.is_number())
                   return EResult::InvalidFormat;
-                return WholeNumber(json, value) ? EResult::Ok : EResult::InvalidValue;
+                const auto number = IntegerOf(json, token);
+                if (!number || *number > std::numeric_limits<Number>::max())
+                  return EResult::InvalidValue;
+                value = static_cast<Number>(*number);
+                return EResult::Ok;
               });
+}
+
+IResult ArgumentReader::UInt64(std::uint64_t& value)
+{
+  return Integer("a whole number from 0 to 18446744073709551615", value);
 }
 
 IResult ArgumentReader::UInt32(std::uint32_t& value)
 {
-  return Next("a whole number from 0 to 4294967295",
-              [&](const boost::json::value& json, std::string_view /*token*/)
-              {
-                if (!json.is_number())
-                  return EResult::InvalidFormat;
-                std::uint64_t number = 0;
-                if (!WholeNumber(json, number) || number > std::numeric_limits<std::uint32_t>::max())
-                  return EResult::InvalidValue;
-                value = static_cast<std::uint32_t>(number);
-                return EResult::Ok;
-              });
+  return Integer("a whole number from 0 to 4294967295", value);
 }
 
 IResult ArgumentReader::Double(double& value)

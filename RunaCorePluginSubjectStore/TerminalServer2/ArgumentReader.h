@@ -40,6 +40,9 @@ private:
   template <class Convert>
   NMX::IResult Next(std::string_view expected, Convert convert);
 
+  template <class Number>
+  NMX::IResult Integer(std::string_view expected, Number& value);
+
   NMX::IResult Fail(NMX::EResult code, std::string_view expected);
 
   std::string_view& m_text;

@@ -41,7 +41,7 @@ EvaluatedObject ReadObject(const NMX::IStoreReader& reader, NMX::TSubjectStoreId
   object.enabled = enabled != nullptr && *enabled;
 
   // A basic object has the one, a smart object the other.
-  for (const NMX::EntryPath path : {NMX::Paths::Markers(), NMX::Paths::AdditionalMarkerPositions()})
+  for (const NMX::EntryPath& path : {NMX::Paths::Markers(), NMX::Paths::AdditionalMarkerPositions()})
   {
     const auto* positions = Find<std::vector<NMX::Position>>(reader, id, path);
     if (positions == nullptr)

@@ -4,6 +4,7 @@
 #include "StandaloneHost/Files/ElementReader.h"
 #include "StandaloneHost/Files/EntryTree.h"
 #include "StandaloneHost/Files/ValueText.h"
+#include "StoreInterface/ValueLimits.h"
 
 #include <algorithm>
 #include <array>
@@ -145,34 +146,32 @@ NMX::Value Parser::ReadEntry(const Element& element, EValueType type, std::vecto
 std::vector<NMX::SmartCluster> Parser::ReadClusters()
 {
   std::vector<NMX::SmartCluster> clusters;
-  ForEachChild(m_xml, "SmartCluster",
-               [&](const Element& element)
-               {
-                 element.AllowAttributes({"label", "device", "pattern", "type"});
-                 clusters.push_back({element.FilledAttribute("label"), OptionalAttribute(element, "device"),
-                                     ReadAttribute<std::uint32_t>(element, "pattern"),
-                                     element.FilledAttribute("type")});
-                 m_xml.LeaveEmpty();
-               });
+  constexpr ListForm clusterList{"SmartCluster", "cluster", NMX::ValueLimits::elements};
+  ForEachOf(m_xml, clusterList,
+            [&](const Element& element)
+            {
+              element.AllowAttributes({"label", "device", "pattern", "type"});
+              clusters.push_back({element.RequiredAttribute("label"), OptionalAttribute(element, "device"),
+                                  ReadAttribute<std::uint32_t>(element, "pattern"), element.RequiredAttribute("type")});
+              m_xml.LeaveEmpty();
+            });
   return clusters;
 }
 
 std::vector<NMX::Slot> Parser::ReadSlots(std::vector<FillingContent>& fillings)
 {
   std::vector<NMX::Slot> slots;
-  Once once;
-  ForEachChild(m_xml, "Slot",
-               [&](const Element& element)
-               {
-                 element.AllowAttributes({"name", "object"});
-                 const std::string& name = element.FilledAttribute("name");
-                 once.Check(element.place, "slot " + Quoted(name), name);
-                 const NMX::TSubjectStoreId id(slots.size() + 1);
-                 slots.push_back({id, name});
-                 if (element.Attribute("object") != nullptr)
-                   fillings.push_back({element.place, id, element.FilledAttribute("object")});
-                 m_xml.LeaveEmpty();
-               });
+  constexpr ListForm slotList{"Slot", "slot", NMX::ValueLimits::elements};
+  ForEachOf(m_xml, slotList,
+            [&](const Element& element)
+            {
+              element.AllowAttributes({"name", "object"});
+              const NMX::TSubjectStoreId id(slots.size() + 1);
+              slots.push_back({id, element.RequiredAttribute("name")});
+              if (element.Attribute("object") != nullptr)
+                fillings.push_back({element.place, id, element.FilledAttribute("object")});
+              m_xml.LeaveEmpty();
+            });
   return slots;
 }
 

@@ -5,7 +5,9 @@
 #include "StandaloneHost/Files/ElementWriter.h"
 #include "StandaloneHost/Files/EntryTree.h"
 #include "StandaloneHost/Files/ValueText.h"
+#include "StandaloneHost/Store/NameRule.h"
 #include "StoreInterface/EntryPaths.h"
+#include "StoreInterface/ValueLimits.h"
 
 #include <algorithm>
 #include <map>
@@ -38,7 +40,7 @@ std::vector<std::string> KeysWith(const IStoreReader& store, std::string_view pa
 {
   std::vector<std::string> keys;
   const std::string end = '/' + std::string(name);
-  for (const NMX::EntryPath path : store.ApplicationEntries(NMX::EntryPath(parent)))
+  for (const NMX::EntryPath& path : store.ApplicationEntries(NMX::EntryPath(parent)))
   {
     const std::string_view key = path.Text().substr(parent.size() + 1);
     if (key.ends_with(end) && key.find('/') == key.size() - end.size() &&
@@ -145,6 +147,8 @@ void SubjectWriter::Write(TSubjectStoreId id)
   NMX::ESubjectKind kind{};
   Check(m_store.Kind(id, kind));
   const auto name = Get<std::string>(id, Paths::Name());
+  if (!Store::NameRule::Allows(name))
+    throw ConfigurationError("subject " + Quoted(name) + ": that is no name for a subject any more, rename it");
   ElementWriter::Attributes attributes{{"kind", std::string(NMX::KindKey(kind))}, {"name", name}};
   if (const auto parent = Get<TSubjectStoreId>(id, Paths::ParentSubjectId());
       m_subjects.contains(parent) && !SlotOf(id).Valid())
@@ -181,6 +185,8 @@ void SubjectWriter::WriteEntries(TSubjectStoreId id, const EntryNode& node)
 
 void SubjectWriter::WriteEntry(TSubjectStoreId id, const EntryNode& node, const NMX::Value& value)
 {
+  if (const std::string problem = NMX::ValueLimits::Problem(value); !problem.empty())
+    throw ConfigurationError(Tag(node.name) + ' ' + problem);
   switch (node.entry->type)
   {
   case EValueType::Positions:

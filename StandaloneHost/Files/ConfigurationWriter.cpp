@@ -1,5 +1,6 @@
 #include "StandaloneHost/Files/ConfigurationWriter.h"
 
+#include "StandaloneHost/Store/NameRule.h"
 #include "StoreInterface/EntryPaths.h"
 
 #include <string_view>
@@ -12,6 +13,7 @@ namespace Files
 using NMX::EResult;
 using NMX::IResult;
 using NMX::TSubjectStoreId;
+using Store::NameRule::Canonical;
 namespace Paths = NMX::Paths;
 
 namespace
@@ -55,8 +57,8 @@ private:
   void SetApplicationEntry(const Place& place, const std::string& path, NMX::Value value);
 
   NMX::IEntryEditor& m_editor;
-  std::unordered_map<std::string_view, Added> m_added;
-  Places<TSubjectStoreId> m_fillings; // by the object
+  std::unordered_map<std::string, Added> m_added; // by the names' canonical forms
+  Places<TSubjectStoreId> m_fillings;             // by the object
 };
 
 void Writer::AddDevices(const std::vector<DeviceContent>& devices, EKnownDevices known)
@@ -94,10 +96,10 @@ void Writer::AddPresets(const std::vector<PresetContent>& presets)
 
 void Writer::AddSubjects(const std::vector<SubjectContent>& subjects)
 {
-  Places<std::string_view> names;
+  Places<std::string> names;
   for (const SubjectContent& subject : subjects)
   {
-    CheckUnique<std::string_view>(names, subject.name, subject.place, "subject name " + Quoted(subject.name));
+    CheckUnique(names, Canonical(subject.name), subject.place, "subject name " + Quoted(subject.name));
     AddSubject(subject);
   }
 }
@@ -114,7 +116,7 @@ void Writer::AddSubject(const SubjectContent& subject)
   if (added.Failed())
     Fail(subject.place, "the store refuses the subject " + Quoted(subject.name) + ": " + std::string(added.Name()),
          added);
-  m_added.emplace(subject.name, Added{id, &subject});
+  m_added.emplace(Canonical(subject.name), Added{id, &subject});
   for (const EntryContent& entry : subject.entries)
     SetValue(entry.place, id, entry.path, entry.value);
 }
@@ -123,7 +125,7 @@ void Writer::LinkSubjects(const std::vector<SubjectContent>& subjects)
 {
   for (const SubjectContent& subject : subjects)
   {
-    const Added& added = m_added.at(subject.name);
+    const Added& added = m_added.at(Canonical(subject.name));
     if (subject.parent)
       SetParent(subject.place, added.id, Find(subject.place, "parent", *subject.parent).id,
                 "parent " + Quoted(*subject.parent));
@@ -134,7 +136,7 @@ void Writer::LinkSubjects(const std::vector<SubjectContent>& subjects)
 
 const Writer::Added& Writer::Find(const Place& place, std::string_view role, const std::string& name) const
 {
-  const auto found = m_added.find(name);
+  const auto found = m_added.find(Canonical(name));
   if (found == m_added.end())
     Fail(place, "unknown " + std::string(role) + ' ' + Quoted(name) + ", expected the name of a loaded subject");
   return found->second;

@@ -1,5 +1,7 @@
 #include "StandaloneHost/Files/ElementParts.h"
 
+#include "StoreInterface/ValueLimits.h"
+
 #include <algorithm>
 
 namespace Files
@@ -43,21 +45,23 @@ void ReadSections(ElementReader& xml, const Element& parent, std::initializer_li
 
 Section TruthValue(ElementReader& xml, std::string_view name, bool& value)
 {
-  return {name, EPresence::Optional, [&xml, &value](const Element& element)
-          { value = ReadAs<bool>(element.place, Tag(element.name), xml.LeaveWithText()); }};
+  return {name, EPresence::Optional, [&xml, &value](const Element& element) {
+            value = ReadAs<bool>(element.place, Tag(element.name), xml.LeaveWithText());
+          }};
 }
 
 std::vector<NMX::Position> ReadMarkers(ElementReader& xml)
 {
   std::vector<NMX::Position> markers;
-  ForEachChild(xml, "Marker",
-               [&](const Element& element)
-               {
-                 element.AllowAttributes({"x", "y", "z"});
-                 markers.push_back({ReadAttribute<double>(element, "x"), ReadAttribute<double>(element, "y"),
-                                    ReadAttribute<double>(element, "z")});
-                 xml.LeaveEmpty();
-               });
+  constexpr ListForm markerList{"Marker", "marker", NMX::ValueLimits::positions};
+  ForEachOf(xml, markerList,
+            [&](const Element& element)
+            {
+              element.AllowAttributes({"x", "y", "z"});
+              markers.push_back({ReadAttribute<double>(element, "x"), ReadAttribute<double>(element, "y"),
+                                 ReadAttribute<double>(element, "z")});
+              xml.LeaveEmpty();
+            });
   return markers;
 }
 

@@ -53,7 +53,7 @@ void ForEachChild(ElementReader& xml, std::string_view name, ReadChild readChild
   }
 }
 
-/// What the children of a list are: all have that element name, and there are 1 to `most`.
+/// What the children of a list are: all have that element name, and there are at most `most`.
 struct ListForm
 {
   std::string_view element;
@@ -63,7 +63,7 @@ struct ListForm
 
 /// Reads each child of a list, which is the element that was entered last.
 template <class ReadChild>
-void ForEachInList(ElementReader& xml, const Element& list, const ListForm& form, ReadChild readChild)
+std::size_t ForEachOf(ElementReader& xml, const ListForm& form, ReadChild readChild)
 {
   std::size_t count = 0;
   ForEachChild(xml, form.element,
@@ -74,7 +74,14 @@ void ForEachInList(ElementReader& xml, const Element& list, const ListForm& form
                         "one " + std::string(form.noun) + " too many, expected at most " + std::to_string(form.most));
                  readChild(child);
                });
-  if (count == 0)
+  return count;
+}
+
+/// The same for a list that has at least one.
+template <class ReadChild>
+void ForEachInList(ElementReader& xml, const Element& list, const ListForm& form, ReadChild readChild)
+{
+  if (ForEachOf(xml, form, readChild) == 0)
     Fail(list.place, Tag(list.name) + " is empty, expected at least one " + std::string(form.element));
 }
 

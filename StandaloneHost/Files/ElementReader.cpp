@@ -1,5 +1,8 @@
 #include "StandaloneHost/Files/ElementReader.h"
 
+#include "StandaloneHost/Files/PercentText.h"
+#include "StoreInterface/ValueLimits.h"
+
 #include <QString>
 #include <QXmlStreamReader>
 
@@ -10,6 +13,9 @@ namespace Files
 
 namespace
 {
+
+/// Announces how the texts of its element are encoded.
+constexpr const char* encodingAttribute = "encoding";
 
 std::string ToText(QStringView text)
 {
@@ -98,7 +104,10 @@ public:
       Check();
     } while (m_xml.isComment() || m_xml.isProcessingInstruction() || m_xml.isStartDocument());
     if (m_xml.isEndElement())
+    {
+      m_closed = std::move(m_open.back());
       m_open.pop_back();
+    }
     return m_xml.tokenType();
   }
 
@@ -106,10 +115,21 @@ public:
   Element Start()
   {
     Element element{ToText(m_xml.qualifiedName()), {}, PlaceAt(TagBegin())};
+    const bool encoded = IsEncoded(element);
     for (const QXmlStreamAttribute& attribute : m_xml.attributes())
-      element.attributes.emplace_back(ToText(attribute.qualifiedName()), ToText(attribute.value()));
-    m_open.push_back(element.name);
+    {
+      const std::string name = ToText(attribute.qualifiedName());
+      if (name != encodingAttribute)
+        element.attributes.emplace_back(name, AttributeText(element, name, ToText(attribute.value()), encoded));
+    }
+    m_open.push_back({element.name, element.place, encoded});
     return element;
+  }
+
+  /// The text of the element that was left last, of which the file holds `text`.
+  [[nodiscard]] std::string TextOfClosed(std::string text) const
+  {
+    return m_closed.encoded ? Decoded(m_closed.place, Tag(m_closed.name), text) : std::move(text);
   }
 
   [[nodiscard]] bool IsWhitespace() const { return m_xml.isWhitespace(); }
@@ -131,8 +151,44 @@ public:
   }
 
 private:
+  struct OpenElement
+  {
+    std::string name;
+    Place place;
+    bool encoded; // whether it announces that its texts are
+  };
+
   /// The element that was entered last.
-  [[nodiscard]] const std::string& Open() const { return m_open.back(); }
+  [[nodiscard]] const std::string& Open() const { return m_open.back().name; }
+
+  [[nodiscard]] bool IsEncoded(const Element& element) const
+  {
+    if (!m_xml.attributes().hasAttribute(QLatin1String(encodingAttribute)))
+      return false;
+    if (const std::string encoding = ToText(m_xml.attributes().value(QLatin1String(encodingAttribute)));
+        encoding != "percent")
+      Fail(element.place, "the encoding of " + Tag(element.name) + " is " + Quoted(encoding) + ", expected percent");
+    return true;
+  }
+
+  static std::string AttributeText(const Element& element, const std::string& name, std::string text, bool encoded)
+  {
+    const std::string what = "attribute " + Quoted(name) + " of " + Tag(element.name);
+    if (encoded)
+      text = Decoded(element.place, what, text);
+    if (const std::string problem = NMX::ValueLimits::TextProblem(text); !problem.empty())
+      Fail(element.place, what + ' ' + problem);
+    return text;
+  }
+
+  static std::string Decoded(const Place& place, const std::string& what, const std::string& text)
+  {
+    auto decoded = FromPercent(text);
+    if (!decoded || !NMX::ValueLimits::IsUtf8(*decoded))
+      Fail(place, what + " is " + Quoted(text) +
+                      (decoded ? ", expected a text in UTF-8" : ", expected two hexadecimal digits after each %"));
+    return *std::move(decoded);
+  }
 
   /// Where the tag begins that the latest token ends with: no tag has another "<" in it.
   [[nodiscard]] qsizetype TagBegin() const { return m_text.lastIndexOf(u'<', m_xml.characterOffset() - 1); }
@@ -180,7 +236,8 @@ private:
   qsizetype m_begin = 0; // where the latest token begins, when the one before it is a tag
   qsizetype m_counted = 0;
   Place m_place; // of the character m_counted
-  std::vector<std::string> m_open;
+  std::vector<OpenElement> m_open;
+  OpenElement m_closed{}; // the one that was left last
 };
 
 ElementReader::ElementReader(const std::filesystem::path& file, std::size_t maximumBytes)
@@ -223,7 +280,7 @@ std::string ElementReader::LeaveWithText()
     if (token == QXmlStreamReader::StartElement)
       m_tokens->FailAtChild();
     if (token == QXmlStreamReader::EndElement)
-      return text;
+      return m_tokens->TextOfClosed(std::move(text));
     text += ToText(m_tokens->Text());
   }
 }

@@ -1,7 +1,8 @@
 #include "StandaloneHost/Files/ElementWriter.h"
 
 #include "StandaloneHost/Files/ConfigurationError.h"
-#include "StoreInterface/WideText.h"
+#include "StandaloneHost/Files/PercentText.h"
+#include "StoreInterface/ValueLimits.h"
 
 #include <algorithm>
 
@@ -11,17 +12,7 @@ namespace Files
 namespace
 {
 
-bool IsXml(wchar_t c)
-{
-  return c >= 0x20 ? c != 0xFFFE && c != 0xFFFF : c == L'\t' || c == L'\n' || c == L'\r';
-}
-
-void CheckText(std::string_view element, std::string_view text)
-{
-  const auto wide = NMX::ToWide(text);
-  if (!wide || !std::all_of(wide->begin(), wide->end(), IsXml))
-    throw ConfigurationError("a text of " + Tag(element) + " has a character that no XML file can hold");
-}
+constexpr std::string_view percentAttribute = " encoding=\"percent\"";
 
 /// White space other than a space would be read as a space in an attribute, and a line's end in a text as another.
 std::string Escaped(std::string_view text)
@@ -51,6 +42,18 @@ std::string Escaped(std::string_view text)
       escaped += c;
     }
   return escaped;
+}
+
+/// What the file holds of a text, in an element that announces an encoding or does not.
+std::string Content(std::string_view text, bool encoded)
+{
+  return Escaped(encoded ? ToPercent(text) : std::string(text));
+}
+
+void CheckText(std::string_view element, std::string_view text)
+{
+  if (!NMX::ValueLimits::IsUtf8(text))
+    throw ConfigurationError("a text of " + Tag(element) + " is not UTF-8, which no file can hold");
 }
 
 }
@@ -101,9 +104,12 @@ void ElementWriter::Add(std::string_view name, const Attributes& attributes)
 void ElementWriter::AddText(std::string_view name, std::string_view text)
 {
   CheckText(name, text);
+  const bool encoded = !FitsXml(text);
   BeginLine();
-  AppendTag(name, {});
-  m_text += '>' + Escaped(text) + "</" + std::string(name) + ">\n";
+  m_text.append("<").append(name);
+  if (encoded)
+    m_text += percentAttribute;
+  m_text += '>' + Content(text, encoded) + "</" + std::string(name) + ">\n";
 }
 
 std::string ElementWriter::Finish()
@@ -122,12 +128,16 @@ void ElementWriter::BeginLine()
 
 void ElementWriter::AppendTag(std::string_view name, const Attributes& attributes)
 {
+  const bool encoded =
+      std::ranges::any_of(attributes, [](const auto& attribute) { return !FitsXml(attribute.second); });
   m_text.append("<").append(name);
   for (const auto& [attribute, text] : attributes)
   {
     CheckText(name, text);
-    m_text.append(" ").append(attribute).append("=\"").append(Escaped(text)).append("\"");
+    m_text.append(" ").append(attribute).append("=\"").append(Content(text, encoded)).append("\"");
   }
+  if (encoded)
+    m_text += percentAttribute;
 }
 
 }

@@ -9,8 +9,9 @@
 namespace Files
 {
 
-/// Puts together the text of an XML file, element by element, as ElementReader reads it. Throws ConfigurationError for
-/// a text with characters that XML cannot hold.
+/// Puts together the text of an XML file, element by element, as ElementReader reads it. The texts of an element,
+/// of which one has characters that XML cannot hold, are encoded. Throws ConfigurationError for a text that is no
+/// UTF-8.
 class ElementWriter
 {
 public:

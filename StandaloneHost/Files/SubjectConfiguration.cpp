@@ -59,7 +59,7 @@ void RemoveSubjectsAndPresets(NMX::IEntryEditor& editor)
     for (const TSubjectStoreId id : ids)
       Check(editor.Remove(id));
   }
-  for (const NMX::EntryPath path : editor.ApplicationEntries(NMX::Paths::PathConstant<"Application/ObjectPresets">()))
+  for (const NMX::EntryPath& path : editor.ApplicationEntries(NMX::Paths::PathConstant<"Application/ObjectPresets">()))
     Check(editor.SetApplicationEntry(path, {}));
 }
 

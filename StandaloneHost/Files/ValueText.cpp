@@ -1,6 +1,7 @@
 #include "StandaloneHost/Files/ValueText.h"
 
 #include "StoreInterface/ColourText.h"
+#include "StoreInterface/ValueLimits.h"
 #include "StoreInterface/WideText.h"
 
 #include <charconv>
@@ -139,6 +140,8 @@ NMX::Value ReadValue(EValueType type, const Place& place, std::string_view what,
   Read value = form.read(text);
   if (!value)
     Fail(place, std::string(what) + " is " + Quoted(text) + ", expected " + std::string(form.expected));
+  if (const std::string problem = NMX::ValueLimits::Problem(*value); !problem.empty())
+    Fail(place, std::string(what) + ' ' + problem);
   return *std::move(value);
 }
 

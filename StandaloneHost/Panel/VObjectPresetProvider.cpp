@@ -40,7 +40,7 @@ IResult VObjectPresetProvider::Apply(NMX::IEntryEditor& access, TSubjectStoreId 
   if (kind != NMX::ESubjectKind::BasicObjects && kind != NMX::ESubjectKind::SmartObjects)
     return EResult::InvalidType;
   // The preset exists, so its path may be numbered.
-  for (const EntryPath entry : access.ApplicationEntries(EntryPath(path)))
+  for (const EntryPath& entry : access.ApplicationEntries(EntryPath(path)))
   {
     const std::string_view parameter = entry.Text().substr(path.size() + 1);
     if (!parameter.starts_with("Parameters/"))

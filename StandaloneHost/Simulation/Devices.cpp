@@ -68,7 +68,7 @@ std::set<std::string> Devices::UrnsWith(std::string_view entry) const
   std::set<std::string> urns;
   const std::string end = '/' + std::string(entry);
   const auto reader = m_store->Reader();
-  for (const NMX::EntryPath path : reader->ApplicationEntries(NMX::Paths::PathConstant<"Application/Devices">()))
+  for (const NMX::EntryPath& path : reader->ApplicationEntries(NMX::Paths::PathConstant<"Application/Devices">()))
   {
     std::string_view text = path.Text();
     text.remove_prefix(std::min(devices.size(), text.size()));
@@ -112,7 +112,7 @@ IResult Devices::Remove(const std::string& urn)
   if (!Exists(*editor, urn))
     return EResult::NotFound;
   // The device exists, so its path may be numbered.
-  for (const NMX::EntryPath path : editor->ApplicationEntries(NMX::EntryPath(std::string(devices) + urn)))
+  for (const NMX::EntryPath& path : editor->ApplicationEntries(NMX::EntryPath(std::string(devices) + urn)))
     if (const IResult removed = editor->SetApplicationEntry(path, {}); removed.Failed())
       return removed;
   return editor->Commit();

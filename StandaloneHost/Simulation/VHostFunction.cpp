@@ -1,11 +1,11 @@
 #include "StandaloneHost/Simulation/VHostFunction.h"
 
 #include "HostInterface/NMX/GlobalLog.h"
+#include "HostInterface/NMX/IntegerText.h"
 
 #include <boost/json/stream_parser.hpp>
 
 #include <algorithm>
-#include <cmath>
 #include <exception>
 #include <limits>
 #include <utility>
@@ -42,23 +42,23 @@ std::string_view Expected(const ArgumentValue& value)
   return "a text";
 }
 
-EResult ToWholeNumber(const boost::json::value& json, std::uint32_t& number)
+/// `token` is the value's text: however an integer is written, it is the same number.
+EResult ToInteger(const boost::json::value& json, std::string_view token, std::uint32_t& integer)
 {
-  // However a whole number is written, it is the same number; a double holds every one that fits.
   if (!json.is_number())
     return EResult::InvalidFormat;
-  const double real = json.to_number<double>();
-  if (!(real >= 0 && real <= std::numeric_limits<std::uint32_t>::max()) || std::trunc(real) != real)
+  const auto number = NMX::IntegerFromJsonNumber(token);
+  if (!number || *number > std::numeric_limits<std::uint32_t>::max())
     return EResult::InvalidValue;
-  number = static_cast<std::uint32_t>(real);
+  integer = static_cast<std::uint32_t>(*number);
   return EResult::Ok;
 }
 
 /// The JSON value in the type that `value` has.
-EResult Convert(const boost::json::value& json, ArgumentValue& value)
+EResult Convert(const boost::json::value& json, std::string_view token, ArgumentValue& value)
 {
   if (auto* number = std::get_if<std::uint32_t>(&value))
-    return ToWholeNumber(json, *number);
+    return ToInteger(json, token, *number);
   if (auto* flag = std::get_if<bool>(&value); flag != nullptr && json.is_bool())
     *flag = json.get_bool();
   else if (auto* text = std::get_if<std::string>(&value); text != nullptr && json.is_string())
@@ -90,7 +90,7 @@ EResult ReadValue(std::string_view& text, ArgumentValue& value)
     return EResult::EndOfData;
   if (error)
     return error == boost::json::error::exponent_overflow ? EResult::InvalidValue : EResult::InvalidFormat;
-  const EResult converted = Convert(parser.release(), value);
+  const EResult converted = Convert(parser.release(), text.substr(0, read), value);
   if (converted == EResult::Ok)
     text.remove_prefix(read);
   return converted;

@@ -41,7 +41,7 @@ std::vector<Device> Devices(const NMX::IStoreReader& access)
   constexpr std::string_view prefix = "Application/Devices/";
   constexpr std::string_view suffix = "/Type";
   std::vector<Device> devices;
-  for (const NMX::EntryPath path : access.ApplicationEntries(NMX::EntryPath("Application/Devices")))
+  for (const NMX::EntryPath& path : access.ApplicationEntries(NMX::EntryPath("Application/Devices")))
   {
     const std::string_view text = path.Text();
     if (!text.ends_with(suffix) || text.size() <= prefix.size() + suffix.size())

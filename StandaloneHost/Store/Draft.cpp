@@ -3,6 +3,7 @@
 #include "StandaloneHost/Store/VStoreReader.h"
 
 #include <algorithm>
+#include <iterator>
 #include <utility>
 
 namespace Store
@@ -23,10 +24,32 @@ const SubjectRecord* Draft::Find(Id id) const
 
 const SubjectRecord* Draft::Find(std::string_view name) const
 {
+  const SubjectRecord* record = FindExact(name);
+  return record != nullptr ? record : FindCanonical(name);
+}
+
+const SubjectRecord* Draft::FindExact(std::string_view name) const
+{
   if (const auto changed = m_names.find(name); changed != m_names.end())
     return Find(changed->second);
-  const SubjectRecord* record = m_base.Find(name);
+  const SubjectRecord* record = m_base.FindExact(name);
   return record != nullptr ? Find(record->id) : nullptr;
+}
+
+const SubjectRecord* Draft::FindCanonical(std::string_view name) const
+{
+  if (NameRule::IsAscii(name) && m_otherNames.empty() && m_base.Find(name) == nullptr)
+    return nullptr;
+  const std::string canonical = NameRule::Canonical(name);
+  std::vector<Id> candidates = m_base.Named(canonical);
+  const auto [first, last] = m_otherNames.equal_range(canonical);
+  std::transform(first, last, std::back_inserter(candidates), [](const auto& named) { return named.second; });
+  if (const auto changed = m_names.find(canonical); changed != m_names.end())
+    candidates.push_back(changed->second);
+  for (const Id id : candidates)
+    if (const SubjectRecord* record = Find(id); record != nullptr && NameRule::Canonical(record->Name()) == canonical)
+      return record;
+  return nullptr;
 }
 
 std::vector<Draft::Id> Draft::Subjects(NMX::ESubjectKind kind) const
@@ -68,8 +91,8 @@ std::vector<NMX::EntryPath> Draft::ApplicationEntries(NMX::EntryPath path) const
 Draft::Id Draft::Add(NMX::ESubjectKind kind, std::string name)
 {
   const Id id = m_changes.nextId;
-  auto record = std::make_unique<SubjectRecord>(id, kind, name);
-  m_names[std::move(name)] = id;
+  Name(id, name);
+  auto record = std::make_unique<SubjectRecord>(id, kind, std::move(name));
   m_changes.subjects.emplace(id, ChangedSubject{std::move(record), kind, allAspects});
   m_changes.nextId = Id(id.Value() + 1);
   return id;
@@ -104,8 +127,15 @@ void Draft::Rename(Id id, std::string name)
 {
   SubjectRecord& record = Change(id, NMX::EAspect::Parameters);
   m_names[record.Name()] = Id{};
-  m_names[name] = id;
+  Name(id, name);
   record.name = std::move(name);
+}
+
+void Draft::Name(Id id, const std::string& name)
+{
+  m_names[name] = id;
+  if (!NameRule::IsAscii(name))
+    m_otherNames.emplace(NameRule::Canonical(name), id);
 }
 
 void Draft::MoveUnder(Id id, Id parent, Id slot)
@@ -129,6 +159,10 @@ void Draft::MoveUnder(Id id, Id parent, Id slot)
 
 void Draft::SetApplicationEntry(NMX::EntryPath path, NMX::Value value)
 {
+  if (std::holds_alternative<std::monostate>(value))
+    m_entriesRemoved += FindApplicationEntry(path) != nullptr;
+  else
+    m_entriesAdded += FindApplicationEntry(path) == nullptr;
   m_changes.applicationEntries.insert_or_assign(path, std::move(value));
 }
 

@@ -23,6 +23,10 @@ public:
   [[nodiscard]] const SubjectRecord* Find(std::string_view name) const;
   [[nodiscard]] std::vector<Id> Subjects(NMX::ESubjectKind kind) const;
   [[nodiscard]] const NMX::Value* FindApplicationEntry(NMX::EntryPath path) const;
+  [[nodiscard]] std::size_t ApplicationEntryCount() const
+  {
+    return m_base.ApplicationEntries().size() + m_entriesAdded - m_entriesRemoved;
+  }
   [[nodiscard]] std::vector<NMX::EntryPath> ApplicationEntries(NMX::EntryPath path) const;
 
   /// Adds a subject; nobody has its name.
@@ -42,9 +46,16 @@ public:
   [[nodiscard]] ChangeSet& Changes() { return m_changes; }
 
 private:
+  [[nodiscard]] const SubjectRecord* FindExact(std::string_view name) const;
+  [[nodiscard]] const SubjectRecord* FindCanonical(std::string_view name) const;
+  void Name(Id id, const std::string& name);
+
   const StoreState& m_base;
   ChangeSet m_changes;
   std::map<std::string, Id, std::less<>> m_names; // names that changed; the invalid id: nobody has it any more
+  std::multimap<std::string, Id> m_otherNames;    // given here and not ASCII, by canonical form; some are left again
+  std::size_t m_entriesAdded = 0;
+  std::size_t m_entriesRemoved = 0;
 };
 
 }

@@ -6,6 +6,9 @@
 #include <algorithm>
 #include <map>
 #include <set>
+#include <string>
+#include <unordered_map>
+#include <unordered_set>
 
 namespace Store
 {
@@ -167,7 +170,7 @@ private:
 
   void FindTouched()
   {
-    std::set<std::string> keys;
+    std::unordered_set<std::string> keys;
     for (const auto& [id, change] : m_draft.Changes().subjects)
     {
       const SubjectRecord* before = m_draft.Base().Find(id);
@@ -347,13 +350,14 @@ private:
 
   const Bits& m_bits = Bits::Instance();
   Draft& m_draft;
-  std::set<Id> m_changed;                                // objects that the edit changes
-  std::map<std::string, std::vector<Id>> m_changedLinks; // by their links as the edit leaves them
-  std::map<Id, unsigned> m_touched;                      // objects whose warnings may be others, and which of them
-  std::map<std::string, std::uint64_t> m_proximityGroups;
-  std::map<std::string, std::uint64_t> m_templateGroups;
-  std::map<std::string, std::size_t> m_users;
-  std::map<std::string, std::size_t> m_blinkers;
+  std::set<Id> m_changed;           // objects that the edit changes
+  std::map<Id, unsigned> m_touched; // objects whose warnings may be others, and which of them
+  // Hashed: long texts that begin alike are slow to put in order.
+  std::unordered_map<std::string, std::vector<Id>> m_changedLinks; // by their links as the edit leaves them
+  std::unordered_map<std::string, std::uint64_t> m_proximityGroups;
+  std::unordered_map<std::string, std::uint64_t> m_templateGroups;
+  std::unordered_map<std::string, std::size_t> m_users;
+  std::unordered_map<std::string, std::size_t> m_blinkers;
 };
 
 }

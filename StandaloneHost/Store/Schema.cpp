@@ -133,8 +133,8 @@ std::vector<Row> Rows()
       {general, Paths::ModelOutputPluginKinex(), EValueType::Bool, false, EAspect::ModelOutputs},
   };
   for (const char* name : warningNames)
-    rows.push_back(
-        {all, NMX::EntryPath(std::string("Warnings/Warning") + name), EValueType::Bool, false, EAspect::Warnings});
+    rows.push_back({all, NMX::EntryPath::Constant(std::string("Warnings/Warning") + name), EValueType::Bool, false,
+                    EAspect::Warnings});
   return rows;
 }
 

@@ -8,6 +8,19 @@
 namespace Store
 {
 
+namespace
+{
+
+/// Takes an id out of an index, which keeps no empty sets.
+template <class Index>
+void EraseFrom(Index& index, const std::string& key, NMX::TSubjectStoreId id)
+{
+  if (const auto found = index.find(key); found != index.end() && found->second.erase(id) != 0 && found->second.empty())
+    index.erase(found);
+}
+
+}
+
 const std::set<NMX::TSubjectStoreId>& StoreState::Subjects(NMX::ESubjectKind kind) const
 {
   return m_kinds[static_cast<std::size_t>(kind)];
@@ -20,29 +33,52 @@ const std::set<NMX::TSubjectStoreId>& StoreState::Linked(const std::string& key)
   return found != m_links.end() ? found->second : none;
 }
 
-void StoreState::Erase(NMX::TSubjectStoreId id)
+std::vector<NMX::TSubjectStoreId> StoreState::Named(const std::string& canonical) const
+{
+  std::vector<NMX::TSubjectStoreId> ids;
+  if (const auto found = m_otherNames.find(canonical); found != m_otherNames.end())
+    ids.assign(found->second.begin(), found->second.end());
+  if (NameRule::IsAscii(canonical))
+    if (const SubjectRecord* record = FindExact(canonical); record != nullptr)
+      ids.push_back(record->id);
+  return ids;
+}
+
+const SubjectRecord* StoreState::FindCanonical(std::string_view name) const
+{
+  const auto ids = Named(NameRule::Canonical(name));
+  return ids.empty() ? nullptr : Find(ids.front());
+}
+
+void StoreState::Erase(NMX::TSubjectStoreId id, bool linksStay)
 {
   const auto found = m_records.find(id);
   if (found == m_records.end())
     return;
-  m_names.erase(found->second->Name());
+  const std::string& name = found->second->Name();
+  m_names.erase(name);
+  if (!NameRule::IsAscii(name))
+    EraseFrom(m_otherNames, NameRule::Canonical(name), id);
   m_kinds[static_cast<std::size_t>(found->second->kind)].erase(id);
-  for (const std::string& key : LinksOf(*found->second))
-    if (const auto link = m_links.find(key); link->second.erase(id) != 0 && link->second.empty())
-      m_links.erase(link);
+  if (!linksStay)
+    for (const std::string& key : LinksOf(*found->second))
+      EraseFrom(m_links, key, id);
   m_autoAssignable.erase(id);
   m_awaitingObjects.erase(id);
   m_records.erase(found);
 }
 
-void StoreState::Insert(std::unique_ptr<SubjectRecord> record)
+void StoreState::Insert(std::unique_ptr<SubjectRecord> record, bool linksStay)
 {
   auto& place = m_records[record->id];
   place = std::move(record);
   m_names.emplace(place->Name(), place.get());
+  if (!NameRule::IsAscii(place->Name()))
+    m_otherNames[NameRule::Canonical(place->Name())].insert(place->id);
   m_kinds[static_cast<std::size_t>(place->kind)].insert(place->id);
-  for (const std::string& key : LinksOf(*place))
-    m_links[key].insert(place->id);
+  if (!linksStay)
+    for (const std::string& key : LinksOf(*place))
+      m_links[key].insert(place->id);
   if (IsAutoAssignable(*place))
     m_autoAssignable.insert(place->id);
   if (AwaitsObjects(*place))
@@ -55,8 +91,11 @@ void StoreState::Apply(ChangeSet&& changes) noexcept
   for (auto& [id, change] : changes.subjects)
   {
     if (const SubjectRecord* old = Find(id); old != nullptr && change.record != nullptr)
+    {
       change.record->stamps = old->stamps;
-    Erase(id);
+      change.sameLinks = LinksOf(*old) == LinksOf(*change.record);
+    }
+    Erase(id, change.sameLinks);
   }
   for (auto& [id, change] : changes.subjects)
   {
@@ -65,7 +104,7 @@ void StoreState::Apply(ChangeSet&& changes) noexcept
     for (std::size_t aspect = 0; aspect < change.record->stamps.size(); ++aspect)
       if ((change.aspects >> aspect & 1U) != 0)
         change.record->stamps[aspect] = ++m_lastStamp;
-    Insert(std::move(change.record));
+    Insert(std::move(change.record), change.sameLinks);
   }
   for (auto& [path, value] : changes.applicationEntries)
   {

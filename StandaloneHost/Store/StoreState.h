@@ -1,5 +1,6 @@
 #pragma once
 
+#include "StandaloneHost/Store/NameRule.h"
 #include "StandaloneHost/Store/SubjectRecord.h"
 
 #include <boost/unordered/unordered_flat_map.hpp>
@@ -8,6 +9,7 @@
 #include <map>
 #include <memory>
 #include <set>
+#include <string>
 #include <string_view>
 #include <vector>
 
@@ -20,6 +22,7 @@ struct ChangedSubject
   std::unique_ptr<SubjectRecord> record; ///< null when the subject is removed
   NMX::ESubjectKind kind;
   std::uint8_t aspects = 0; ///< one bit for each EAspect that changed
+  bool sameLinks = false;   ///< as before the change; worked out when it is applied
 };
 
 /// What one commit changes.
@@ -42,11 +45,19 @@ public:
     return found != m_records.end() ? found->second.get() : nullptr;
   }
 
+  /// The subject of that very name, or else of one that is the same in its canonical form.
   [[nodiscard]] const SubjectRecord* Find(std::string_view name) const
+  {
+    const SubjectRecord* record = FindExact(name);
+    return record != nullptr || (m_otherNames.empty() && NameRule::IsAscii(name)) ? record : FindCanonical(name);
+  }
+  [[nodiscard]] const SubjectRecord* FindExact(std::string_view name) const
   {
     const auto found = m_names.find(name);
     return found != m_names.end() ? found->second : nullptr;
   }
+  /// All whose names have that canonical form; there is more than one only in stores of earlier versions.
+  [[nodiscard]] std::vector<NMX::TSubjectStoreId> Named(const std::string& canonical) const;
 
   [[nodiscard]] const std::set<NMX::TSubjectStoreId>& Subjects(NMX::ESubjectKind kind) const;
 
@@ -65,14 +76,19 @@ public:
   void Apply(ChangeSet&& changes) noexcept;
 
 private:
-  void Insert(std::unique_ptr<SubjectRecord> record);
-  void Erase(NMX::TSubjectStoreId id);
+  /// The standard hash takes a long text by words, not by bytes.
+  using TextIndex = boost::unordered_flat_map<std::string, std::set<NMX::TSubjectStoreId>, std::hash<std::string>>;
+
+  [[nodiscard]] const SubjectRecord* FindCanonical(std::string_view name) const;
+  void Insert(std::unique_ptr<SubjectRecord> record, bool linksStay);
+  void Erase(NMX::TSubjectStoreId id, bool linksStay);
 
   boost::unordered_flat_map<NMX::TSubjectStoreId, std::unique_ptr<SubjectRecord>, std::hash<NMX::TSubjectStoreId>>
       m_records;
   boost::unordered_flat_map<std::string_view, const SubjectRecord*> m_names; // keys look into the records
+  TextIndex m_otherNames;                                                    // not ASCII; by canonical form
   std::array<std::set<NMX::TSubjectStoreId>, NMX::allSubjectKinds.size()> m_kinds;
-  boost::unordered_flat_map<std::string, std::set<NMX::TSubjectStoreId>> m_links;
+  TextIndex m_links;
   std::set<NMX::TSubjectStoreId> m_autoAssignable;
   std::set<NMX::TSubjectStoreId> m_awaitingObjects;
   std::map<NMX::EntryPath, NMX::Value> m_application;

@@ -4,6 +4,7 @@
 #include "StandaloneHost/Store/NameRule.h"
 #include "StandaloneHost/Store/VStoreReader.h"
 #include "StoreInterface/EntryPaths.h"
+#include "StoreInterface/ValueLimits.h"
 
 #include <utility>
 
@@ -89,10 +90,10 @@ IResult VEntryEditor::Rename(Id id, std::string_view name, NMX::ENotify /*notify
   const SubjectRecord* record = Record(id);
   if (record == nullptr)
     return EResult::InvalidId;
-  if (const IResult checked = CheckName(name, id); checked.Failed())
-    return checked;
   if (record->Name() == name)
     return EResult::Ok;
+  if (const IResult checked = CheckName(name, id); checked.Failed())
+    return checked;
   ForgetLatest();
   m_draft.Rename(id, std::string(name));
   return EResult::Ok;
@@ -123,6 +124,8 @@ IResult VEntryEditor::SetValue(Id id, NMX::EntryPath path, NMX::Value value, NMX
     return EResult::InvalidValue;
   if (record->Get(*entry) == value)
     return EResult::Ok;
+  if (!NMX::ValueLimits::Admits(value, record->Get(*entry)))
+    return EResult::InvalidValue;
 
   ForgetLatest();
   if (path == NMX::Paths::ParentSubjectId())
@@ -149,8 +152,20 @@ IResult VEntryEditor::SetApplicationEntry(NMX::EntryPath path, NMX::Value value)
   const NMX::Value* known = m_draft.FindApplicationEntry(path);
   if (known != nullptr ? *known == value : std::holds_alternative<std::monostate>(value))
     return EResult::Ok;
+  if (!NMX::ValueLimits::Admits(value, known != nullptr ? *known : NMX::Value{}))
+    return EResult::InvalidValue;
+  if (known == nullptr)
+    if (const IResult checked = CheckNewEntry(path); checked.Failed())
+      return checked;
   m_draft.SetApplicationEntry(path, std::move(value));
   return EResult::Ok;
+}
+
+IResult VEntryEditor::CheckNewEntry(const NMX::EntryPath& path) const
+{
+  if (!NMX::ValueLimits::TextProblem(path.Text(), NMX::ValueLimits::pathBytes).empty())
+    return EResult::InvalidValue;
+  return m_draft.ApplicationEntryCount() < NMX::ValueLimits::entries ? EResult::Ok : EResult::AllocationFailure;
 }
 
 IResult VEntryEditor::Commit()

@@ -46,6 +46,7 @@ private:
 
   [[nodiscard]] bool Open() const { return m_edit.owns_lock(); }
   [[nodiscard]] NMX::IResult CheckName(std::string_view name, Id owner) const;
+  [[nodiscard]] NMX::IResult CheckNewEntry(const NMX::EntryPath& path) const;
   NMX::IResult SetParent(Id id, Id parent);
 
   std::unique_lock<std::mutex> m_edit;

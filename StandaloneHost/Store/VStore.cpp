@@ -131,7 +131,7 @@ void VStore::TellApplication(const std::vector<NMX::EntryPath>& paths)
   {
     const std::lock_guard lock(m_patternMutex);
     for (const auto& subscription : m_patterns)
-      for (const NMX::EntryPath path : paths)
+      for (const NMX::EntryPath& path : paths)
         if (subscription.beneath ? path.Text().starts_with(subscription.path) : path.Text() == subscription.path)
         {
           concerned.push_back(subscription.callback);

@@ -163,11 +163,19 @@ test('A new name is taken when it is fit and free', () => withConnectedHost(asyn
   }
   assertSucceeds(await rename(name, 'Crate'));
   assertSucceeds(await rename('Crate', 'Crate'));
+  // One name in two forms: kept as given, found by either.
+  assertSucceeds(await rename('Crate', 'Caf\u00e9'));
+  assertFails(await rename('Barrel', 'Cafe\u0301'), named('Rename'), 'AlreadyPresent');
+  assertSucceeds(await rename('Cafe\u0301', 'Crate'));
 
   const before = await snapshot(connection);
   for (const unfit of ['', ' ', ' Box', 'Box ', '\u0000', 'Bo\u0000x', 'Bo\nx', '\u001fBox', 'Box\u007f', 'a/b', 'a\\b',
-                       'a:b', 'a*b', 'a?b', 'a"b', 'a<b', 'a>b', 'a|b', 'n'.repeat(256), 'ß'.repeat(128)])
+                       'a:b', 'a*b', 'a?b', 'a"b', 'a<b', 'a>b', 'a|b', 'n'.repeat(256), 'ß'.repeat(128), '..',
+                       '\u00a0', 'Box\u2003', 'B\u0085x', 'B\u200bx', '\u202exoB'])
     assertFails(await rename('Crate', unfit), named('Rename'), 'InvalidName');
+  for (const setter of ['SetProximityGroupName', 'SetTemplateGroupName'])
+    for (const long of ['x'.repeat(1025), 'ß'.repeat(513), 'x'.repeat(1_000_000)])
+      assertFails(await connection.call(named(setter), ['Crate', long]), named(setter), 'InvalidValue');
   for (const held of ['Barrel', ...Object.values(otherKinds)])
     assertFails(await rename('Crate', held), named('Rename'), 'AlreadyPresent');
   assert.deepEqual(await snapshot(connection), before);

@@ -192,7 +192,7 @@ void Stage::clear()
       (void)editor->Remove(id);
   }
   for (const char* root : {"Application/Devices", "Application/ObjectPresets"})
-    for (const NMX::EntryPath path : editor->ApplicationEntries(NMX::EntryPath(root)))
+    for (const NMX::EntryPath& path : editor->ApplicationEntries(NMX::EntryPath(root)))
       (void)editor->SetApplicationEntry(path, {});
   (void)editor->Commit();
 }

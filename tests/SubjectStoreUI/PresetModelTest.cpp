@@ -59,7 +59,7 @@ protected:
   std::vector<std::string> Entries(const std::string& preset) const
   {
     std::vector<std::string> entries;
-    for (const NMX::EntryPath path : store->Reader()->ApplicationEntries(NMX::EntryPath(presets + preset)))
+    for (const NMX::EntryPath& path : store->Reader()->ApplicationEntries(NMX::EntryPath(presets + preset)))
       entries.emplace_back(path.Text().substr(presets.size() + preset.size() + 1));
     return entries;
   }
@@ -116,6 +116,7 @@ TEST_F(PresetModelTest, ANewNameIsOneThatNoPresetHas)
 {
   SetAll({{"1/Name", std::string("Default")}, {"2/Name", std::string("\xC3\xA4")}});
   const auto model = Make();
+  EXPECT_FALSE(model->presetNameIsValid(QString(1025, QChar(u'n'))));
   for (const auto& [name, valid] : std::initializer_list<std::pair<const char*, bool>>{{"", false},
                                                                                        {"Default", false},
                                                                                        {"default", true},

@@ -68,7 +68,7 @@ inline StoreDump Dump(const NMX::IStore& store)
         subject.slots.push_back(slot.name);
     }
   }
-  for (const NMX::EntryPath path : reader->ApplicationEntries(NMX::EntryPath("Application")))
+  for (const NMX::EntryPath& path : reader->ApplicationEntries(NMX::EntryPath("Application")))
     if (!path.Text().starts_with("Application/Settings"))
       dump.application.emplace(path.Text(), *reader->FindApplicationEntry(path));
   return dump;

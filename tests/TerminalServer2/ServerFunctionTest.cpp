@@ -106,10 +106,20 @@ TEST_F(ServerFunctionTest, ReadsEveryTypeAndStepsPastTheArrayOnly)
   EXPECT_EQ(finished.result, IResult(EResult::Ok));
   EXPECT_EQ(finished.output, "caf\xC3\xA9 \xF0\x9F\x98\x80\n|1|4294967295|-25.000000|18446744073709551615");
 
-  // However a whole number is written, it is the same number.
-  finished = {};
-  EXPECT_EQ(Call(R"(["",false,1.0,3,70e-1])"), "");
-  EXPECT_EQ(finished.output, "|0|1|3.000000|7");
+  // However an integer is written, it is the same number, to the last digit.
+  for (const auto& [text, number] : {std::pair{"70e-1", "7"},
+                                     {"-0.0", "0"},
+                                     {"0e999", "0"},
+                                     {"9007199254740993.0", "9007199254740993"},
+                                     {"0.9007199254740993e+16", "9007199254740993"},
+                                     {"18446744073709551615e0", "18446744073709551615"},
+                                     {"1844674407370955161500.00e-2", "18446744073709551615"},
+                                     {"1000000000000000000000000000000e-30", "1"}})
+  {
+    finished = {};
+    EXPECT_EQ(Call("[\"\",false,1.0,3," + std::string(text) + "]"), "") << text;
+    EXPECT_EQ(finished.output, "|0|1|3.000000|" + std::string(number)) << text;
+  }
 
   // Exactly the number that is nearest to what is written.
   for (const auto& [text, number] : {std::pair{"234.20657862927774", 234.20657862927774},
@@ -132,6 +142,7 @@ TEST_F(ServerFunctionTest, RefusesWhatDoesNotFitBeforeTheServiceIsAsked)
     const char* complaint;
   };
   const std::string deep = std::string(100000, '[');
+  constexpr const char* big = "argument 5 \"Big\": expected a whole number from 0 to 18446744073709551615";
   const Case cases[] = {
       {"", EResult::EndOfData, "expected an array of arguments"},
       {" \t\r\n", EResult::EndOfData, "expected an array of arguments"},
@@ -156,8 +167,13 @@ TEST_F(ServerFunctionTest, RefusesWhatDoesNotFitBeforeTheServiceIsAsked)
        "argument 3 \"Count\": expected a whole number from 0 to 4294967295"},
       {"[\"a\",true,1,1e999", EResult::InvalidValue, "argument 4 \"Factor\": expected a number"},
       {"[\"a\",true,1,NaN", EResult::InvalidFormat, "argument 4 \"Factor\": expected a number"},
-      {"[\"a\",true,1,1,18446744073709551616", EResult::InvalidValue,
-       "argument 5 \"Big\": expected a whole number from 0 to 18446744073709551615"},
+      {"[\"a\",true,1,1,18446744073709551616", EResult::InvalidValue, big},
+      {"[\"a\",true,1,1,18446744073709551615.5", EResult::InvalidValue, big},
+      {"[\"a\",true,1,1,1844674407370955161.6e1", EResult::InvalidValue, big},
+      {"[\"a\",true,1,1,9007199254740993.000000001", EResult::InvalidValue, big},
+      {"[\"a\",true,1,1,-9007199254740993.0", EResult::InvalidValue, big},
+      {"[\"a\",true,1,1,1e20", EResult::InvalidValue, big},
+      {"[\"a\",true,1,1,1e-400", EResult::InvalidValue, big},
       {"[\"a\",true,1,1,1", EResult::EndOfData, "after 5 arguments: expected no further argument"},
       {"[\"a\",true,1,1,1,1]", EResult::InvalidFormat, "after 5 arguments: expected no further argument"},
       {"[\"a\",true,1,1,1}", EResult::InvalidFormat, "after 5 arguments: expected no further argument"},

@@ -18,9 +18,9 @@ TEST_F(FileIOTest, ATemplateOfASubjectReadsBackAsWhatItStartsWith)
 {
   const Id belt = Add(ESubjectKind::SmartObjects, "Belt");
   Set(belt, Paths::SmartClusters(),
-      std::vector<NMX::SmartCluster>{{awkward, "urn", 3, "Corvex1"}, {"Back", "", 0, "Corvex1"}});
+      std::vector<NMX::SmartCluster>{{awkward, "urn", 3, "Corvex1"}, {"\x01%41 Back", "", 0, "Corvex1"}});
   ASSERT_TRUE(io.ExportTemplate(belt, Wide(file), reason).Succeeded()) << reason;
-  SmartObjects::SmartObjectTemplate object{{{awkward, "Corvex1"}, {"Back", "Corvex1"}}, {}};
+  SmartObjects::SmartObjectTemplate object{{{awkward, "Corvex1"}, {"\x01%41 Back", "Corvex1"}}, {}};
   EXPECT_TRUE(SmartObjects::ReadTemplate(file) == object);
   object.additionalMarkers = {{0.1, -2, 1e-9}};
   Set(belt, Paths::AdditionalMarkerPositions(), object.additionalMarkers);

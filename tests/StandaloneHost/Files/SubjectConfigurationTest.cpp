@@ -235,6 +235,11 @@ TEST_F(SubjectConfigurationTest, TextsAreTakenExactly)
               "\xEF\xBB\xBF<?xml version='1.0' encoding='utf-8'?>\r\n<!-- one -->" +
                   Subjects("<Subject kind='GeneralSubjects' name='A &amp; " + face + "'>" + content + "</Subject>"))});
   const std::string name = "A & " + face;
+  Load({Write("b.xml",
+              Object("<Parameters encoding='percent'><PresetName encoding='percent'>%01%25%c3%A9%00</PresetName>"
+                     "<TemplateGroupName>%41</TemplateGroupName></Parameters>"))});
+  EXPECT_EQ(Value<std::string>("Crate", Paths::PresetName()), std::string("\x01%\u00E9\0", 5));
+  EXPECT_EQ(Value<std::string>("Crate", Paths::TemplateGroupName()), "%41") << "its own element announces nothing";
   EXPECT_EQ(Value<std::wstring>(name, Paths::Retarget()), L" a<b>\u00E4\U0001F600");
   EXPECT_EQ(Value<std::int32_t>(name, Paths::Calibration()), -2147483647 - 1);
 }
@@ -260,6 +265,13 @@ TEST_F(SubjectConfigurationTest, RefusesMalformedFilesAndTellsWhere)
   {
     return Subjects("<Subject kind='SmartObjects' name='Torch'><SmartObject><SmartClusters>\n<SmartCluster " +
                     std::string(attributes) + "/></SmartClusters></SmartObject></Subject>");
+  };
+  const auto many = [](const std::string& element, int count)
+  {
+    std::string elements;
+    for (int i = 0; i < count; ++i)
+      elements += element;
+    return elements;
   };
   std::string deep = "<Parameters>";
   for (int depth = 0; depth < 100000; ++depth)
@@ -303,6 +315,10 @@ TEST_F(SubjectConfigurationTest, RefusesMalformedFilesAndTellsWhere)
       // Devices and presets
       {devices(changed(device, "urn='u'", "")), "2:1: <Device> lacks an attribute", "expected \"urn\""},
       {devices(changed(device, "'u'", "''")), "2:1: attribute \"urn\" of <Device> is empty"},
+      {devices(changed(device, "'u'", '\'' + std::string(1025, 'u') + '\'')),
+       "2:1: attribute \"urn\" of <Device> is a"},
+      {devices(changed(device, "'t'", '\'' + std::string(1025, 't') + '\'')),
+       "2:1: attribute \"type\" of <Device> is a"},
       {devices(changed(device, "'u'", "'a/b'")), "2:1: the urn is \"a/b\""},
       {devices(changed(device, "'true'", "'1'")), "2:1: attribute \"connected\" of <Device> is \"1\"", "true or false"},
       {devices(changed(device, "'1'", "'101'")), "2:1: the battery has 101 percent", "at most 100"},
@@ -344,14 +360,35 @@ TEST_F(SubjectConfigurationTest, RefusesMalformedFilesAndTellsWhere)
       {Object("<Parameters><Flags>2</Flags></Parameters>"),
        "3:13: the store refuses the value of Parameters/Flags: InvalidValue"},
       {Parameters("<Calibration>2147483648</Calibration>"), "3:1: <Calibration> is \"2147483648\"", "2147483647"},
+      {Parameters("<Retarget>" + std::string(4097, 'p') + "</Retarget>"), "3:1: <Retarget> is a text of 4097 bytes",
+       "expected at most 4096"},
+      {Object("<Parameters><PresetName>" + std::string(1025, 'p') + "</PresetName></Parameters>"),
+       "3:13: <PresetName> is a text of 1025 bytes", "expected at most 1024"},
+      {Object("<Parameters><PresetName encoding='hex'>p</PresetName></Parameters>"),
+       "3:13: the encoding of <PresetName> is \"hex\"", "expected percent"},
+      {Object("<Parameters><PresetName encoding='percent'>a%4</PresetName></Parameters>"),
+       "3:13: <PresetName> is \"a%4\"", "expected two hexadecimal digits after each %"},
+      {Object("<Parameters><PresetName encoding='percent'>a%C3</PresetName></Parameters>"),
+       "3:13: <PresetName> is \"a%C3\"", "UTF-8"},
+      {Subjects("<Subject kind='Props' name='%zz' encoding='percent'/>"), "2:1: attribute \"name\" of <Subject> is"},
       {Parameters("<Calibration>1 </Calibration>"), "3:1: <Calibration> is \"1 \""},
       {Parameters("<Calibration>a\nb" + std::string(1000, 'c') + "</Calibration>"), "3:1: <Calibration> is \"a b"},
       {Object("<Markers>\n<Marker x='0' y='0'/></Markers>"), "4:1: <Marker> lacks an attribute", "expected \"z\""},
       {Object("<Markers>\n<Marker x='0' y='nan' z='0'/></Markers>"), "4:1: attribute \"y\" of <Marker> is \"nan\"",
        "a finite number"},
       {Object("<Markers>\n<Marker x='0' y='1e999' z='0'/></Markers>"), "4:1: attribute \"y\""},
+      {Object("<Markers>\n" + many("<Marker x='0' y='0' z='0'/>\n", 4097) + "</Markers>"),
+       "4100:1: one marker too many, expected at most 4096"},
+      {Subjects("<Subject kind='SmartObjects' name='Torch'><SmartObject><SmartClusters>\n" +
+                many("<SmartCluster label='l' pattern='1' type='t'/>\n", 257) +
+                "</SmartClusters></SmartObject></Subject>"),
+       "259:1: one cluster too many, expected at most 256"},
       {Object("<Markers><marker/></Markers>"), "3:10: unknown element <marker>", "expected Marker"},
-      {cluster("label='' pattern='1' type='t'"), "3:1: attribute \"label\" of <SmartCluster> is empty"},
+      {cluster("label='" + std::string(1025, 'l') + "' pattern='1' type='t'"),
+       "3:1: attribute \"label\" of <SmartCluster> is a text of 1025 bytes", "expected at most 1024"},
+      {cluster("label='l' pattern='1' type='t" + std::string(1024, 't') + '\''), "3:1: attribute \"type\""},
+      {cluster("label='l' pattern='1' type='t' device='u" + std::string(1024, 'u') + '\''),
+       "3:1: attribute \"device\""},
       {cluster("label='l' pattern='-1' type='t'"), "3:1: attribute \"pattern\" of <SmartCluster> is \"-1\""},
 
       // Subjects and what they refer to
@@ -362,12 +399,15 @@ TEST_F(SubjectConfigurationTest, RefusesMalformedFilesAndTellsWhere)
       {Subjects("<Subject kind='Props' name=''/>"), "2:1: the store refuses the name \"\" (InvalidName)"},
       {Subjects("<Subject kind='Props' name='x'/>\n <Subject kind='Markerless' name='x'/>"),
        "3:2: duplicate subject name \"x\"", "a.xml:2:1"},
+      {Subjects("<Subject kind='Props' name='caf\u00E9'/>\n <Subject kind='Markerless' name='cafe\u0301'/>"),
+       "3:2: duplicate subject name \"cafe\u0301\"", "a.xml:2:1"},
+      {Subjects("<Subject kind='Props' name='..'/>"), "2:1: the store refuses the name \"..\" (InvalidName)"},
       {Subjects("<Subject kind='Props' name='x' parent='y'/>"), "2:1: unknown parent \"y\""},
       {Subjects("<Subject kind='Props' name='x' parent='x'/>"), "2:1: parent \"x\" would make"},
       {Subjects("<Subject kind='Props' name='x' parent='y'/>\n<Subject kind='Props' name='y' parent='x'/>"),
        "3:1: parent \"x\" would make", "without a cycle"},
-      {character("<Slot name=''/>"), "3:1: attribute \"name\" of <Slot> is empty"},
-      {character("<Slot name='Head'/>\n<Slot name='Head'/>"), "4:1: repeated slot \"Head\"", "a.xml:3:1"},
+      {character("<Slot name='" + std::string(1025, 's') + "'/>"), "3:1: attribute \"name\" of <Slot> is a text"},
+      {character(many("<Slot name='s'/>\n", 257)), "259:1: one slot too many, expected at most 256"},
       {character("<Slot name='Head' object='Cap'/>"), "3:1: unknown object \"Cap\""},
       {character("<Slot name='Head' object='Miner'/>"), "3:1: \"Miner\" is of kind CFCs", "a basic or smart object"},
       {character("<Slot name='Head' object='Cap'/>\n<Slot name='Tool' object='Cap'/></Slots></Subject>"

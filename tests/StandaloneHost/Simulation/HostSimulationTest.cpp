@@ -67,7 +67,8 @@ TEST_F(HostFunctionTest, ReadsItsInputsAndRunsOnItsPostalService)
   for (const auto& [arguments, inputs] :
        std::map<std::string, Values>{{R"( [ "caf\u00e9\n" ,true , 4294967295 ])", {"caf\xC3\xA9\n", true, 4294967295U}},
                                      {R"(["",false,70e-1])", {"", false, 7U}},
-                                     {R"(["",false,-0])", {"", false, 0U}}})
+                                     {R"(["",false,-0.0])", {"", false, 0U}},
+                                     {R"(["",false,429496729500e-2])", {"", false, 4294967295U}}})
   {
     EXPECT_EQ(Call(arguments + " ,\"id\":1}"), " ,\"id\":1}");
     EXPECT_EQ(times, 0) << arguments;
@@ -98,6 +99,8 @@ TEST_F(HostFunctionTest, RefusesWhatDoesNotFitAtOnce)
       {"[\"a\",true,\"1\"", EResult::InvalidFormat, third},
       {"[\"a\",true,1.5", EResult::InvalidValue, third},
       {"[\"a\",true,4294967296", EResult::InvalidValue, third},
+      {"[\"a\",true,4294967294.99999999999", EResult::InvalidValue, third},
+      {"[\"a\",true,1e-400", EResult::InvalidValue, third},
       {"[\"a\",true,18446744073709551616", EResult::InvalidValue, third},
       {"[\"a\",true,1e99999999999", EResult::InvalidValue, third},
       {"[\"a\",true,1", EResult::EndOfData, end},
@@ -189,6 +192,9 @@ TEST_F(DevicesTest, EachEditIsOneCommitAndARemovedDeviceIsGone)
   }
   EXPECT_EQ(devices.Urns(), std::set<std::string>{"one more"});
   EXPECT_TRUE(store->Reader()->ApplicationEntries(NMX::EntryPath("Application/Devices/one")).empty());
+  EXPECT_TRUE(NMX::EntryPath::Known("Application/Devices/one more/Type"));
+  for (const char* entry : {"Type", "Connected", "Charging", "Battery", "Radio"})
+    EXPECT_FALSE(NMX::EntryPath::Known("Application/Devices/one/"s + entry)) << "its memory is given back: " << entry;
 }
 
 TEST_F(DevicesTest, RefusesAndChangesNothing)
@@ -204,6 +210,7 @@ TEST_F(DevicesTest, RefusesAndChangesNothing)
   for (const std::string& urn : {std::string(), "two/three"s, "two\0"s, "two\x1F"s, "two\x7F"s, longest + 'x'})
     EXPECT_EQ(devices.Add(urn, "T"), IResult(EResult::InvalidArgument)) << urn;
   EXPECT_EQ(devices.Add("two", ""), IResult(EResult::InvalidArgument));
+  EXPECT_EQ(devices.Add("two", std::string(1025, 't')), IResult(EResult::InvalidValue));
   EXPECT_EQ(devices.SetBattery(longest, 101), IResult(EResult::InvalidValue));
   expectOnlyFailures("", EResult::NotFound);
   expectOnlyFailures("two", EResult::NotFound);

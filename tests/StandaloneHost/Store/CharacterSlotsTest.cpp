@@ -29,7 +29,7 @@ Warnings WarningsOf(const NMX::IStoreReader& reader, Id character)
                                   Paths::WarningNotCalibrated(), Paths::WarningCFCNoReferenceClusterAssigned(),
                                   Paths::WarningInsufficientAutoAssignCandidates()};
   Warnings warnings;
-  for (const NMX::EntryPath path : derived)
+  for (const NMX::EntryPath& path : derived)
   {
     bool holds = false;
     EXPECT_TRUE(NMX::Read(reader, character, path, holds).Succeeded());
