@@ -158,7 +158,7 @@ TEST_F(PanelSettingsTest, ActionsSayWhatStandsInTheirWay)
   SetSetting(ESetting::CreateSubjectTemplate, NMX::Option{file.wstring(), {{"Small", file.wstring()}}});
   SetSetting(ESetting::CreateSubjectName, std::string("A/B"));
   EXPECT_EQ(Obstacle(), "The name \"A/B\" is not allowed.");
-  SetSetting(ESetting::CreateSubjectName, std::string(1 << 20, 'x'));
+  SetSetting(ESetting::CreateSubjectName, std::string(1024, 'x'));
   EXPECT_EQ(Obstacle(), "The name is too long.") << "and is not repeated in the reason";
   SetSetting(ESetting::CreateSubjectName, std::string("Ada"));
   SetSetting(ESetting::CreateSubjectAction, NMX::Action{2, "Whatever."});
