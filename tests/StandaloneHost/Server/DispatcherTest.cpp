@@ -38,7 +38,7 @@ protected:
   {
     std::string text;
     dispatcher.emplace(registry, notifier, limits, outgoing, 2, "epoch");
-    dispatcher->Handle(message, nullptr, [&](const ResponseText& answer, std::size_t) { text = answer.Flat(); });
+    dispatcher->Handle(message, {}, nullptr, [&](const ResponseText& answer, std::size_t) { text = answer.Flat(); });
     EXPECT_LT(text.size(), 3 * limits.outgoingBytes);
     std::string codes;
     const json::value whole = json::parse(text);
@@ -102,7 +102,7 @@ TEST_F(DispatcherTest, TheDescriptionTakesNoMemoryForEachWhoAsks)
   limits.outgoingBytes = 100000;
   outgoing = std::make_shared<OutgoingBytes>(limits);
   dispatcher.emplace(registry, notifier, limits, outgoing, 2, "epoch");
-  dispatcher->Handle(describe, nullptr,
+  dispatcher->Handle(describe, {}, nullptr,
                      [&](const ResponseText& answer, std::size_t)
                      {
                        EXPECT_LT(answer.OwnBytes(), 100U);
