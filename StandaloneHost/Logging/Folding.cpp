@@ -3,6 +3,7 @@
 #include "StandaloneHost/Logging/LogLine.h"
 
 #include <algorithm>
+#include <functional>
 #include <utility>
 
 namespace Logging
@@ -35,8 +36,8 @@ Folding::Place& Folding::PlaceOf(const NMX::LogRecord& record)
     return *found;
   if (m_places.size() == maximalPlaces)
     return m_places.back();
-  Place place{std::string(record.channel), record.severity, std::string(record.file), record.line, {}, 0, {}, {}};
-  return m_places.emplace_back(std::move(place));
+  return m_places.emplace_back(
+      Place{std::string(record.channel), record.severity, std::string(record.file), record.line});
 }
 
 bool Folding::Passes(const NMX::LogRecord& record, Clock::time_point now)
@@ -44,9 +45,13 @@ bool Folding::Passes(const NMX::LogRecord& record, Clock::time_point now)
   Place& place = PlaceOf(record);
   const auto price = timePerByte * static_cast<Clock::rep>(std::min(record.text.size(), longestText) + bytesBeforeText);
   const auto paidUntil = std::max(place.paidUntil, now) + price;
-  if (paidUntil - now <= timePerByte * static_cast<Clock::rep>(burstBytes))
+  const std::size_t text = std::hash<std::string_view>()(record.text);
+  const bool repeats = text == place.lastText && now - place.lastPassed < reportTime;
+  if (!repeats && paidUntil - now <= timePerByte * static_cast<Clock::rep>(burstBytes))
   {
     place.paidUntil = paidUntil;
+    place.lastText = text;
+    place.lastPassed = now;
     return true;
   }
   HoldBack(place, record.text, now);

@@ -13,8 +13,8 @@ namespace Logging
 {
 
 /// Decides which messages go on when one place of the source has many, so that nobody can fill the log by making it
-/// say the same again, with other details: so many bytes at once and so many per second from each place. What is held
-/// back is counted and reported. Its owner guards it.
+/// say the same again, with other details: so many bytes at once and so many per second from each place, and the same
+/// text once in a while. What is held back is counted and reported. Its owner guards it.
 class Folding
 {
 public:
@@ -50,10 +50,12 @@ private:
     NMX::ESeverity severity;
     std::string file;
     unsigned line;
-    Clock::time_point paidUntil; ///< each byte costs time; a burst is paid for afterwards
+    std::size_t lastText = 0; ///< hash of the last one that went on
+    Clock::time_point lastPassed{};
+    Clock::time_point paidUntil{}; ///< each byte costs time; a burst is paid for afterwards
     std::uint64_t heldBack = 0;
-    Clock::time_point heldBackSince;
-    std::string example; ///< the beginning of the first message that was held back
+    Clock::time_point heldBackSince{};
+    std::string example{}; ///< the beginning of the first message that was held back
   };
 
   Place& PlaceOf(const NMX::LogRecord& record);

@@ -16,7 +16,7 @@ constexpr LimitRow rows[] = {
     {&Limits::nesting, "nesting", "max-nesting", 4, 1000, "Depth of arrays and objects in a message."},
     {&Limits::batchCalls, "batchCalls", "max-batch-calls", 1, 65536, "Calls in a batch."},
     {&Limits::connections, "connections", "max-connections", 4, 65536, "Connections of all clients together."},
-    {&Limits::webSockets, "webSockets", "max-websockets", 1, 65536, "WebSockets among the connections."},
+    {&Limits::webSockets, "webSockets", "max-websockets", 1, 65536, "Connections that are WebSockets."},
     {&Limits::subscriptions, "subscriptions", "max-subscriptions", 1, 65536,
      "Callbacks that a connection subscribes to."},
     {&Limits::callsInFlight, "callsInFlight", "max-calls-in-flight", 1, mebi,

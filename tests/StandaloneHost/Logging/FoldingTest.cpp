@@ -55,6 +55,20 @@ TEST_F(LogFolding, LetsFewerLongMessagesPassThanShortOnesAndTheFirstHoweverLongI
   EXPECT_LT(Passed(1000, 5000), 10);
 }
 
+TEST_F(LogFolding, LetsTheSameTextPassOnceInAWhile)
+{
+  EXPECT_TRUE(Passes("the same"));
+  EXPECT_FALSE(Passes("the same"));
+  EXPECT_TRUE(Passes("another"));
+  EXPECT_TRUE(Passes("the same"));
+  now += 9s;
+  EXPECT_FALSE(Passes("the same"));
+  EXPECT_THAT(folding.Reports(now + 1s),
+              ElementsAre(Field(&Folding::Report::text, "Left out 2 more like this in 10 s: the same")));
+  now += 10s;
+  EXPECT_TRUE(Passes("the same"));
+}
+
 TEST_F(LogFolding, TellsPlacesApartByAllThatNamesThem)
 {
   Passed(10000);
