@@ -109,7 +109,7 @@ TEST(LogWriter, HoldsNobodyUpWhenNobodyReadsAndTellsWhatWasLost)
       {
         std::vector<std::jthread> loggers;
         for (std::size_t i = 0; i < threads; ++i)
-          loggers.emplace_back([] { LogApart(each, std::string(1500, 'x')); });
+          loggers.emplace_back([i] { LogApart(each, std::string(1500, static_cast<char>('a' + i))); });
       });
   EXPECT_LT(taken, 2s);
   EXPECT_FALSE(writer.Flush(1ms));
