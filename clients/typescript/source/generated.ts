@@ -3,7 +3,7 @@
 import type { CallOptions, Caller, Inputs, Method, Outputs, Result } from './types.js';
 
 /** What the greeting of a host with the same API says in `api`. */
-export const apiHash = 'f46e803e7e1661f99f777523f54987f03056498f955485bb28ae4e6df48e60bd';
+export const apiHash = '9d4e7a0ea0d04dcbaeb66e0f8e9542311f3739b12a6460645d689aac139d6372';
 
 /** Every result code by name; failures have the highest bit set. */
 export const ResultCode = {
@@ -1231,7 +1231,7 @@ export interface Hello {
     batchCalls: number;
     /** Connections of all clients together. */
     connections: number;
-    /** WebSockets among the connections. */
+    /** Connections that are WebSockets. */
     webSockets: number;
     /** Callbacks that a connection subscribes to. */
     subscriptions: number;
